@@ -1,0 +1,112 @@
+#include "frame/Catalogue.h"
+
+#include <array>
+
+namespace quendal {
+
+// Factories of the built classes, defined beside each class.
+
+namespace {
+
+using enum Family;
+
+constexpr std::array kCatalogue = {
+    CatalogueEntry{"clsStarTrackDAcln", Consignment, "StarTrack",
+                   "CLN consignment file, dangerous goods declaration", nullptr},
+    CatalogueEntry{"clsTNTDAet11", Consignment, "TNT", "ET11 file", nullptr},
+    CatalogueEntry{"clsStarTrackCMLSCM", Label, "StarTrack", "CML", nullptr},
+    CatalogueEntry{"clsTNTCMLSCM", Label, "TNT", "CML", nullptr},
+    CatalogueEntry{"clsStarTrackDJsSCM", Label, "StarTrack", "David Jones", nullptr},
+    CatalogueEntry{"clsMayneDAcl", Consignment, "Mayne", "CL file", nullptr},
+    CatalogueEntry{"clsMayneCMLSCMLSCP", Label, "Mayne", "CML", nullptr},
+    CatalogueEntry{"clsMayneDJsSCM", Label, "Mayne", "David Jones", nullptr},
+    CatalogueEntry{"clsIpecDA1250", Consignment, "Ipec", "1250 file", nullptr},
+    CatalogueEntry{"clsStarTrackBLSCM", Label, "StarTrack", "BL", nullptr},
+    CatalogueEntry{"clsIpecDA1256", Consignment, "Ipec", "1256 file", nullptr},
+    CatalogueEntry{"clsVicExpressDAcln", Consignment, "VicExpress", "consignment file (\".CTN\")",
+                   nullptr},
+    CatalogueEntry{"clsVLODAcsv", Consignment, "VLO", "map-driven CSV file", nullptr},
+    CatalogueEntry{"clsMayneCMLSCM", Label, "Mayne", "CML", nullptr},
+    CatalogueEntry{"clsMayneGenericSCM", Label, "Mayne", "any retailer", nullptr},
+    CatalogueEntry{"clsStarTrackGenericSCM", Label, "StarTrack", "any retailer (reference class)",
+                   nullptr},
+    CatalogueEntry{"clsTollGenericSCM", Label, "Toll", "any retailer", nullptr},
+    CatalogueEntry{"clsAaEGenericSCM", Label, "AaE", "any retailer", nullptr},
+    CatalogueEntry{"clsAaEES610", Rows, "AaE", "ES610 file", nullptr},
+    CatalogueEntry{"clsDFEDAxml", Consignment, "DFE",
+                   "XML despatch advice, dangerous goods declaration", nullptr},
+    CatalogueEntry{"clsDFESCM", Label, "DFE", "any retailer", nullptr},
+    CatalogueEntry{"clsHunterDA", Consignment, "Hunter", "despatch file", nullptr},
+    CatalogueEntry{"clsHunterGenericSCM", Label, "Hunter", "any retailer", nullptr},
+    CatalogueEntry{"clsStarTrackBigWSCM", Label, "StarTrack", "BigW", nullptr},
+    CatalogueEntry{"clsTollBigWSCM", Label, "Toll", "BigW", nullptr},
+    CatalogueEntry{"clsStarTrackHSSCM", Label, "StarTrack", "HS", nullptr},
+    CatalogueEntry{"clsTollMYERSCM", Label, "Toll", "Myer", nullptr},
+    CatalogueEntry{"clsTNTTransactionDAcsv", Consignment, "TNT", "map-driven CSV transaction file",
+                   nullptr},
+    CatalogueEntry{"clsAlliedExpressSEDIP", Consignment, "Allied Express", "SEDIP file", nullptr},
+    CatalogueEntry{"clsStarTrackRebelSCM", Label, "StarTrack", "Rebel", nullptr},
+    CatalogueEntry{"clsIFSAPISCM", Label, "IFS", "any retailer", nullptr},
+    CatalogueEntry{"clsIFSDJsSCM", Label, "IFS", "David Jones", nullptr},
+    CatalogueEntry{"clsAustPostSCM", Label, "Australia Post", "article-id labels", nullptr},
+    CatalogueEntry{"clseParcelManifestxml", Rows, "Australia Post eParcel", "PCMS manifest", nullptr},
+    CatalogueEntry{"clsSCMnoSSCC", Label, "any", "label without SSCC", nullptr},
+    CatalogueEntry{"clsStarTrackSpotlightSCM", Label, "StarTrack", "Spotlight", nullptr},
+    CatalogueEntry{"clsStarTrackBigWERSCM", Label, "StarTrack", "BigW", nullptr},
+    CatalogueEntry{"clsDFESCMWinPCL", Label, "DFE", "drawn label", nullptr},
+    CatalogueEntry{"clsDFESCMsscc", Label, "DFE", "SSCC label", nullptr},
+    CatalogueEntry{"clsStarTrackManifestcln", Rows, "StarTrack",
+                   "manifest CLN, consolidated manifest, dangerous goods", nullptr},
+    CatalogueEntry{"clsDFEDAManifestxml", Rows, "DFE",
+                   "manifest XML, consolidated manifest, dangerous goods", nullptr},
+    CatalogueEntry{"clsIpecDA1250Manifest", Rows, "Ipec", "1250 manifest, consolidated manifest",
+                   nullptr},
+    CatalogueEntry{"clsStarTrackEODcln", Rows, "StarTrack",
+                   "end-of-day CLN, consolidated manifest, dangerous goods", nullptr},
+    CatalogueEntry{"clsIpecDA1250EOD", Rows, "Ipec", "1250 end of day, consolidated manifest",
+                   nullptr},
+    CatalogueEntry{"clsTollNZSCM", Label, "Toll", "NZ", nullptr},
+    CatalogueEntry{"clsAustPostDespatchSCM", Label, "Australia Post", "despatch article-id labels",
+                   nullptr},
+    CatalogueEntry{"clseParcelManifestEODxml", Rows, "Australia Post eParcel", "PCMS end of day",
+                   nullptr},
+    CatalogueEntry{"clsTollDJsSCM", Label, "Toll", "David Jones", nullptr},
+};
+static_assert(kCatalogue.size() == 48);
+
+constexpr std::string_view kPrefix = "Quendal.";
+
+}  // namespace
+
+std::string_view FamilyName(Family family) {
+  switch (family) {
+    case Label:
+      return "label";
+    case Consignment:
+      return "consignment";
+    case Rows:
+      return "rows";
+  }
+  return "";
+}
+
+std::span<const CatalogueEntry> Catalogue() { return kCatalogue; }
+
+const CatalogueEntry* FindClass(std::string_view identifier) {
+  if (identifier.starts_with(kPrefix)) identifier.remove_prefix(kPrefix.size());
+  for (const auto& entry : kCatalogue)
+    if (entry.className == identifier) return &entry;
+  return nullptr;
+}
+
+Created CreateObject(std::string_view identifier) {
+  if (!identifier.starts_with(kPrefix))
+    return {nullptr, "\"" + std::string(identifier) + "\" is not a Quendal identifier (Quendal.clsName)"};
+  const CatalogueEntry* entry = FindClass(identifier);
+  if (!entry) return {nullptr, "no class " + std::string(identifier) + " in the catalogue"};
+  if (!entry->factory)
+    return {nullptr, std::string(identifier) + " is in the catalogue but not built yet"};
+  return {entry->factory(), {}};
+}
+
+}  // namespace quendal

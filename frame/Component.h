@@ -1,0 +1,123 @@
+// The three families through which the host drives a class: label,
+// consignment and rows. A created object is a Component; the host reaches
+// its family interface with as<>().
+#pragma once
+
+#include <cstdint>
+#include <memory>
+#include <optional>
+#include <string>
+#include <vector>
+
+#include "frame/Var.h"
+#include "frame/host/Host.h"
+
+namespace quendal {
+
+class Component {
+ public:
+  virtual ~Component() = default;
+  // The programmatic identifier, "Quendal." + class name.
+  virtual std::string ClassName() const = 0;
+};
+
+template <class Interface>
+Interface* as(Component* component) {
+  return dynamic_cast<Interface*>(component);
+}
+template <class Interface>
+Interface* as(const std::unique_ptr<Component>& component) {
+  return dynamic_cast<Interface*>(component.get());
+}
+
+// The list of log-entry ids a call hands back (vtErrorLog).
+using LogList = std::vector<std::int32_t>;
+
+// A two-dimensional table of values indexed (row, column) from 0: the
+// column definitions and the rows of the row interface.
+class Grid {
+ public:
+  Grid() = default;
+  Grid(std::size_t rows, std::size_t columns) { Resize(rows, columns); }
+  void Resize(std::size_t rows, std::size_t columns) {
+    rows_ = rows;
+    columns_ = columns;
+    cells_.assign(rows * columns, Var());
+  }
+  std::size_t Rows() const { return rows_; }
+  std::size_t Columns() const { return columns_; }
+  Var& operator()(std::size_t row, std::size_t column) { return cells_.at(row * columns_ + column); }
+  const Var& operator()(std::size_t row, std::size_t column) const {
+    return cells_.at(row * columns_ + column);
+  }
+
+ private:
+  std::size_t rows_ = 0;
+  std::size_t columns_ = 0;
+  std::vector<Var> cells_;
+};
+
+// A label class prints one carton label per pack on the printer named at Init.
+class LabelInterface : public virtual Component {
+ public:
+  virtual bool PrintSCMatOpen() const = 0;
+  virtual void SetPrintSCMatOpen(bool value) = 0;
+  virtual bool OLESubPackComponent() const = 0;
+  virtual void SetOLESubPackComponent(bool value) = 0;
+  virtual bool PrintSCMatClose() const = 0;
+  virtual void SetPrintSCMatClose(bool value) = 0;
+  virtual bool Prepack() const = 0;
+  virtual void SetPrepack(bool value) = 0;
+  virtual bool PrePackComplete() const = 0;
+  virtual void SetPrePackComplete(bool value) = 0;
+  virtual std::string PrePackStyle() const = 0;
+  virtual void SetPrePackStyle(const std::string& value) = 0;
+  virtual bool ValidateClose() const = 0;
+  virtual void SetValidateClose(bool value) = 0;
+  virtual void SetUser1(const std::string& value) = 0;
+  virtual void SetUser2(const std::string& value) = 0;
+  virtual void SetComponentPrint(bool value) = 0;
+  virtual void SetComponentItem(std::int16_t value) = 0;
+  virtual void SetComponentCount(std::int16_t value) = 0;
+  virtual void SetComponentStyle(const std::string& value) = 0;
+  virtual void SetStoreZoneDept(const std::string& value) = 0;
+  virtual std::string PDTFieldLength() const = 0;
+
+  virtual bool Init(const Ref<host::System>& system, const std::string& aPrinter = {}) = 0;
+  virtual bool PrintLabel(const Ref<host::Pack>& aPack, std::optional<std::int16_t> Qty = {},
+                          std::optional<bool> ComDirect = {}) = 0;
+  virtual std::string VPCLIIBatchCommand() = 0;
+  virtual std::string PrintVPCLII() = 0;
+  virtual std::int32_t SpooledJobCount(std::int32_t aPrinterHandle) = 0;
+};
+
+// Members shared by consignment and row classes.
+class LifecycleInterface {
+ public:
+  virtual ~LifecycleInterface() = default;
+  virtual bool PROCESSALL() const = 0;
+  virtual void SetPROCESSALL(bool value) = 0;
+  // A new host Log bound to the last entry this object wrote (ID 0 before any).
+  virtual Ref<host::Log> Log() = 0;
+  // Closes an output file the object holds open.
+  virtual void Cancel() = 0;
+  virtual bool Term() = 0;
+};
+
+// A consignment class appends one consignment per Process call to its carrier's file.
+class ConsignmentInterface : public virtual Component, public virtual LifecycleInterface {
+ public:
+  virtual void Process(const Ref<host::System>& objSystem, const Ref<host::ConNote>& objConNote,
+                       const Ref<host::ASN>& objASN, const Ref<host::PackList>& lstPacks,
+                       LogList& vtErrorLog) = 0;
+};
+
+// A row class lists consignments as grid rows and writes the chosen rows.
+class RowInterface : public virtual Component, public virtual LifecycleInterface {
+ public:
+  virtual bool Init(const Ref<host::System>& system, std::int16_t EDIDocId, Grid& Columns) = 0;
+  virtual std::int32_t Load(const std::string& a_sFileName, Grid& a_vtRows) = 0;
+  virtual std::int32_t Process(std::int32_t a_lRowNum, LogList& vtErrorLog) = 0;
+};
+
+}  // namespace quendal

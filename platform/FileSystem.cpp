@@ -1,0 +1,129 @@
+#include "platform/FileSystem.h"
+
+#include <fcntl.h>
+#include <sys/stat.h>
+#include <unistd.h>
+
+#include <algorithm>
+#include <cstdio>
+#include <ctime>
+#include <filesystem>
+#include <fstream>
+#include <sstream>
+
+namespace quendal {
+
+namespace fs = std::filesystem;
+
+namespace {
+
+DateTime LocalDate(std::time_t t) {
+  std::tm local{};
+  localtime_r(&t, &local);
+  return DateTime::FromParts(local.tm_year + 1900, local.tm_mon + 1, local.tm_mday, local.tm_hour,
+                             local.tm_min, local.tm_sec);
+}
+
+bool WriteAll(int fd, std::string_view bytes) {
+  while (!bytes.empty()) {
+    const ssize_t n = ::write(fd, bytes.data(), bytes.size());
+    if (n < 0) {
+      if (errno == EINTR) continue;
+      return false;
+    }
+    bytes.remove_prefix(static_cast<std::size_t>(n));
+  }
+  return true;
+}
+
+}  // namespace
+
+std::optional<DateTime> CreationDate(const std::string& path) {
+  struct statx sx {};
+  if (statx(AT_FDCWD, path.c_str(), 0, STATX_BTIME | STATX_MTIME, &sx) == 0) {
+    if (sx.stx_mask & STATX_BTIME) return LocalDate(static_cast<std::time_t>(sx.stx_btime.tv_sec));
+    return LocalDate(static_cast<std::time_t>(sx.stx_mtime.tv_sec));
+  }
+  return std::nullopt;
+}
+
+std::optional<std::vector<FileEntry>> ListFiles(const std::string& folder) {
+  std::error_code ec;
+  fs::directory_iterator it(folder, ec);
+  if (ec) return std::nullopt;
+  std::vector<FileEntry> files;
+  for (const auto& entry : it) {
+    std::error_code e2;
+    if (!entry.is_regular_file(e2)) continue;
+    auto created = CreationDate(entry.path().string());
+    files.push_back({entry.path().filename().string(), created.value_or(DateTime())});
+  }
+  std::sort(files.begin(), files.end(),
+            [](const FileEntry& a, const FileEntry& b) { return a.name < b.name; });
+  return files;
+}
+
+bool FolderExists(const std::string& folder) {
+  std::error_code ec;
+  return !folder.empty() && fs::is_directory(folder, ec);
+}
+
+bool FileExists(const std::string& path) {
+  std::error_code ec;
+  return fs::is_regular_file(path, ec);
+}
+
+bool CreateFolder(const std::string& folder) {
+  std::error_code ec;
+  fs::create_directories(folder, ec);
+  return FolderExists(folder);
+}
+
+std::optional<std::string> ReadFile(const std::string& path) {
+  std::ifstream in(path, std::ios::binary);
+  if (!in) return std::nullopt;
+  std::ostringstream ss;
+  ss << in.rdbuf();
+  if (in.bad()) return std::nullopt;
+  return ss.str();
+}
+
+bool AppendFile(const std::string& path, std::string_view bytes) {
+  const int fd = ::open(path.c_str(), O_WRONLY | O_APPEND | O_CREAT | O_CLOEXEC, 0644);
+  if (fd < 0) return false;
+  const bool ok = WriteAll(fd, bytes);
+  return ::close(fd) == 0 && ok;
+}
+
+bool ReplaceFile(const std::string& path, std::string_view bytes) {
+  const fs::path target(path);
+  std::string tmpl = (target.parent_path() / ("." + target.filename().string() + ".XXXXXX")).string();
+  if (target.parent_path().empty()) tmpl = "." + target.filename().string() + ".XXXXXX";
+  const int fd = ::mkstemp(tmpl.data());
+  if (fd < 0) return false;
+  const bool ok = WriteAll(fd, bytes) && ::fsync(fd) == 0;
+  if (::close(fd) != 0 || !ok) {
+    ::unlink(tmpl.c_str());
+    return false;
+  }
+  ::fchmodat(AT_FDCWD, tmpl.c_str(), 0644, 0);
+  if (std::rename(tmpl.c_str(), path.c_str()) != 0) {
+    ::unlink(tmpl.c_str());
+    return false;
+  }
+  return true;
+}
+
+bool DeleteFile(const std::string& path) {
+  std::error_code ec;
+  return fs::remove(path, ec) && !ec;
+}
+
+std::optional<std::uintmax_t> FileSize(const std::string& path) {
+  std::error_code ec;
+  const auto size = fs::file_size(path, ec);
+  if (ec) return std::nullopt;
+  return size;
+}
+
+}  // namespace quendal

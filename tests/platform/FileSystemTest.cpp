@@ -1,0 +1,71 @@
+#include "platform/FileSystem.h"
+
+#include <gtest/gtest.h>
+
+#include <filesystem>
+
+#include "platform/Clock.h"
+
+namespace quendal {
+namespace {
+
+namespace fs = std::filesystem;
+
+class FileSystemTest : public ::testing::Test {
+ protected:
+  void SetUp() override {
+    dir = fs::temp_directory_path() /
+          ("quendal-fs-" + std::to_string(::testing::UnitTest::GetInstance()->random_seed()) + "-" +
+           ::testing::UnitTest::GetInstance()->current_test_info()->name());
+    fs::remove_all(dir);
+    fs::create_directories(dir);
+  }
+  void TearDown() override { fs::remove_all(dir); }
+  std::string Path(const std::string& name) const { return (dir / name).string(); }
+  fs::path dir;
+};
+
+TEST_F(FileSystemTest, ListsFilesByNameWithCreationDates) {
+  ASSERT_TRUE(AppendFile(Path("B.CLN"), "x"));
+  ASSERT_TRUE(AppendFile(Path("a.cln"), "y"));
+  fs::create_directories(dir / "2024-03-15");
+  const auto files = ListFiles(dir.string());
+  ASSERT_TRUE(files);
+  ASSERT_EQ(files->size(), 2u);  // folders are not files
+  EXPECT_EQ((*files)[0].name, "B.CLN");
+  EXPECT_EQ((*files)[1].name, "a.cln");
+  // Created just now, read back through the file system.
+  const DateTime today = Today();
+  EXPECT_EQ((*files)[0].created.DateOnly(), today);
+  EXPECT_FALSE(ListFiles(Path("missing")));
+}
+
+TEST_F(FileSystemTest, AppendCreatesThenExtends) {
+  ASSERT_TRUE(AppendFile(Path("f.txt"), "one\r\n"));
+  ASSERT_TRUE(AppendFile(Path("f.txt"), "two\r\n"));
+  EXPECT_EQ(*ReadFile(Path("f.txt")), "one\r\ntwo\r\n");
+  EXPECT_EQ(*FileSize(Path("f.txt")), 10u);
+  EXPECT_FALSE(AppendFile(Path("no/such/folder/f.txt"), "x"));
+}
+
+TEST_F(FileSystemTest, ReplaceIsAtomicAndLeavesNoTemporaryFile) {
+  ASSERT_TRUE(AppendFile(Path("day.xml"), "old"));
+  ASSERT_TRUE(ReplaceFile(Path("day.xml"), "new"));
+  EXPECT_EQ(*ReadFile(Path("day.xml")), "new");
+  EXPECT_EQ(ListFiles(dir.string())->size(), 1u);
+  // A target in a missing folder fails and the original folder is untouched.
+  EXPECT_FALSE(ReplaceFile(Path("missing/day.xml"), "x"));
+}
+
+TEST_F(FileSystemTest, FoldersAndDeletion) {
+  EXPECT_TRUE(CreateFolder(Path("a/b/c")));
+  EXPECT_TRUE(FolderExists(Path("a/b/c")));
+  EXPECT_FALSE(FolderExists(""));
+  ASSERT_TRUE(AppendFile(Path("gone"), "x"));
+  EXPECT_TRUE(DeleteFile(Path("gone")));
+  EXPECT_FALSE(FileExists(Path("gone")));
+  EXPECT_FALSE(DeleteFile(Path("gone")));
+}
+
+}  // namespace
+}  // namespace quendal

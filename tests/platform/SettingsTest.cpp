@@ -1,0 +1,59 @@
+#include "platform/Settings.h"
+
+#include <gtest/gtest.h>
+
+#include <cstdlib>
+#include <filesystem>
+
+#include "platform/FileSystem.h"
+
+namespace quendal {
+namespace {
+
+namespace fs = std::filesystem;
+
+class SettingsTest : public ::testing::Test {
+ protected:
+  void SetUp() override {
+    dir = fs::temp_directory_path() / ("quendal-settings-" + std::to_string(::getpid()));
+    fs::remove_all(dir);
+    const char* old = std::getenv("XDG_CONFIG_HOME");
+    saved = old ? old : "";
+    had = old != nullptr;
+    ::setenv("XDG_CONFIG_HOME", dir.c_str(), 1);
+  }
+  void TearDown() override {
+    if (had) ::setenv("XDG_CONFIG_HOME", saved.c_str(), 1);
+    else ::unsetenv("XDG_CONFIG_HOME");
+    fs::remove_all(dir);
+  }
+  fs::path dir;
+  std::string saved;
+  bool had = false;
+};
+
+TEST_F(SettingsTest, DefaultWhenMissingThenStoredValues) {
+  EXPECT_EQ(SettingsPath("Merivane"), (dir / "Merivane/settings.ini").string());
+  EXPECT_EQ(GetSetting("Merivane", "Settings", "clsStarTrackGenericSCM", "True"), "True");
+  ASSERT_TRUE(SaveSetting("Merivane", "Settings", "clsStarTrackGenericSCM", "False"));
+  ASSERT_TRUE(SaveSetting("Merivane", "Settings", "clsTollMYERSCM", "0"));
+  ASSERT_TRUE(SaveSetting("Merivane", "Settings", "clsStarTrackGenericSCM", "True"));
+  EXPECT_EQ(GetSetting("Merivane", "Settings", "clsStarTrackGenericSCM", "x"), "True");
+  EXPECT_EQ(GetSetting("Merivane", "Settings", "clsTollMYERSCM", "x"), "0");
+  EXPECT_EQ(GetSetting("Merivane", "Other", "clsTollMYERSCM", "x"), "x");
+  EXPECT_EQ(*ReadFile(SettingsPath("Merivane")),
+            "[Settings]\nclsStarTrackGenericSCM=True\nclsTollMYERSCM=0\n");
+}
+
+TEST_F(SettingsTest, KeepsOtherSectionsAndComments) {
+  fs::create_directories(dir / "Merivane");
+  ASSERT_TRUE(AppendFile((dir / "Merivane/settings.ini").string(),
+                         "; host settings\r\n[Window]\r\nLeft = 10\r\n[Settings]\r\nA=1\r\n"));
+  ASSERT_TRUE(SaveSetting("Merivane", "Settings", "B", "2"));
+  EXPECT_EQ(GetSetting("Merivane", "Window", "Left", ""), "10");
+  EXPECT_EQ(*ReadFile(SettingsPath("Merivane")),
+            "; host settings\n[Window]\nLeft = 10\n[Settings]\nA=1\nB=2\n");
+}
+
+}  // namespace
+}  // namespace quendal

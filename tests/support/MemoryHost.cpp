@@ -1,0 +1,187 @@
+#include "tests/support/MemoryHost.h"
+
+#include "platform/Clock.h"
+
+namespace quendal::test {
+
+namespace {
+
+// Finds the first object of `list` whose member `key` equals `value` as text
+// (Null matches Null), copies its members into `target` and reports success.
+template <class T>
+bool LoadInto(MemoryObject<T>& target, const std::vector<std::shared_ptr<MemoryObject<T>>>& list,
+              std::initializer_list<std::string_view> keys) {
+  for (const auto& candidate : list) {
+    if (candidate.get() == &target) continue;
+    bool match = true;
+    for (std::string_view key : keys) {
+      const Var a = target.Get(key);
+      const Var b = candidate->Get(key);
+      if (a.IsNull() != b.IsNull() || a.Text() != b.Text()) match = false;
+    }
+    if (match) {
+      target.fields = candidate->fields;
+      return true;
+    }
+  }
+  return false;
+}
+
+}  // namespace
+
+void AddMethods(MemoryHost& host, MemoryObject<host::Log>& log) {
+  log.methods["Clear"] = [&log](std::span<const Var>) {
+    log.fields.clear();
+    return Var();
+  };
+  log.methods["Save"] = [&host, &log](std::span<const Var>) {
+    const auto id = static_cast<std::int32_t>(host.logs.size() + 1);
+    log.fields["LogId"] = Var(id);
+    log.fields["ID"] = Var(id);
+    host.logs.push_back(log.fields);
+    return Var();
+  };
+}
+
+void AddMethods(MemoryHost& host, MemoryObject<host::Receiver>& r) {
+  r.methods["Load"] = [&host, &r](std::span<const Var>) {
+    return Var(LoadInto(r, host.receivers, {"Code", "PartnerId"}));
+  };
+  r.methods["Refresh"] = [](std::span<const Var>) { return Var(); };
+}
+
+void AddMethods(MemoryHost& host, MemoryObject<host::Vendor>& o) {
+  o.methods["Load"] = [&host, &o](std::span<const Var>) {
+    return Var(LoadInto(o, host.vendors, {"VendorId"}));
+  };
+}
+
+void AddMethods(MemoryHost& host, MemoryObject<host::Carrier>& o) {
+  o.methods["Load"] = [&host, &o](std::span<const Var>) {
+    return Var(LoadInto(o, host.carriers, {"CarrierId"}));
+  };
+}
+
+void AddMethods(MemoryHost& host, MemoryObject<host::Partner>& o) {
+  o.methods["Load"] = [&host, &o](std::span<const Var>) {
+    return Var(LoadInto(o, host.partners, {"PartnerId"}));
+  };
+}
+
+void AddMethods(MemoryHost& host, MemoryObject<host::EDIDocument>& o) {
+  o.methods["Load"] = [&host, &o](std::span<const Var>) {
+    return Var(LoadInto(o, host.ediDocuments, {"ID"}));
+  };
+}
+
+void AddMethods(MemoryHost& host, MemoryObject<host::Order>& o) {
+  o.methods["Load"] = [&host, &o](std::span<const Var>) {
+    return Var(LoadInto(o, host.orders, {"OrderNo"}));
+  };
+}
+
+void AddMethods(MemoryHost& host, MemoryObject<host::Pack>& p) {
+  p.methods["Load"] = [&host, &p](std::span<const Var>) {
+    return Var(LoadInto(p, host.packs, {"PackId"}));
+  };
+  p.methods["SetCubic"] = [&p](std::span<const Var> args) {
+    p.fields["Cubic"] = args.empty() ? Var() : args[0];
+    return Var();
+  };
+  p.methods["Update"] = [](std::span<const Var>) { return Var(); };
+  p.methods["GetAttribute"] = [&p](std::span<const Var> args) {
+    return args.empty() ? Var() : p.Get("Attribute:" + args[0].Text());
+  };
+}
+
+void AddMethods(MemoryHost&, MemoryObject<host::ConNote>& c) {
+  c.methods["Update"] = [&c](std::span<const Var> args) {
+    if (!args.empty()) c.fields["Status"] = args[0];
+    c.fields["Updated"] = Var(true);
+    return Var();
+  };
+}
+
+void AddMethods(MemoryHost& host, MemoryObject<host::Manifest>& m) {
+  m.fields["ManifestId"] = Var(0);
+  m.methods["Save"] = [&host, &m](std::span<const Var>) {
+    if (host.manifestSaveFails) return Var(false);
+    if (m.Get("ManifestId").Whole() == 0) {
+      m.fields["ManifestId"] = Var(host.nextManifestId++);
+      m.fields["ManifestNumber"] = Var(host.nextManifestNumber++);
+    }
+    return Var(true);
+  };
+}
+
+MemoryHost::MemoryHost() : self_(std::shared_ptr<host::Library>(this, [](host::Library*) {})) {
+  system = Make<host::System>({{"PrinterLanguage", "VPCLII"},
+                               {"PrinterBatchMode", 1},
+                               {"SpoolerMode", 2},
+                               {"UserName", "packer1"}});
+  previous_ = host::RegisterLibrary(self_);
+}
+
+MemoryHost::~MemoryHost() { host::RegisterLibrary(previous_); }
+
+std::vector<std::string> MemoryHost::LogMessages() const {
+  std::vector<std::string> out;
+  for (const auto& entry : logs) {
+    auto it = entry.find("Message");
+    out.push_back(it == entry.end() ? std::string() : it->second.Text());
+  }
+  return out;
+}
+
+void MemoryHost::Attach(const std::shared_ptr<MemoryObject<host::ConNote>>& conNote,
+                        const std::vector<std::shared_ptr<MemoryObject<host::Pack>>>& packList) {
+  auto list = std::make_shared<MemoryCollection<host::PackList>>();
+  for (const auto& pack : packList) {
+    list->items.push_back(pack);
+    pack->fields["ConNote"] = Var(conNote);
+  }
+  conNote->fields["Packs"] = Var(list);
+}
+
+Ref<host::Log> MemoryHost::NewLog() { return Make<host::Log>(); }
+Ref<host::Receiver> MemoryHost::NewReceiver() {
+  auto r = std::make_shared<MemoryObject<host::Receiver>>("Receiver");
+  AddMethods(*this, *r);
+  return r;
+}
+Ref<host::Vendor> MemoryHost::NewVendor() {
+  auto o = std::make_shared<MemoryObject<host::Vendor>>("Vendor");
+  AddMethods(*this, *o);
+  return o;
+}
+Ref<host::Carrier> MemoryHost::NewCarrier() {
+  auto o = std::make_shared<MemoryObject<host::Carrier>>("Carrier");
+  AddMethods(*this, *o);
+  return o;
+}
+Ref<host::Partner> MemoryHost::NewPartner() {
+  auto o = std::make_shared<MemoryObject<host::Partner>>("Partner");
+  AddMethods(*this, *o);
+  return o;
+}
+Ref<host::EDIDocument> MemoryHost::NewEDIDocument() {
+  auto o = std::make_shared<MemoryObject<host::EDIDocument>>("EDIDocument");
+  AddMethods(*this, *o);
+  return o;
+}
+Ref<host::Manifest> MemoryHost::NewManifest() { return Make<host::Manifest>(); }
+Ref<host::ConNotes> MemoryHost::NewConNotes() {
+  return std::make_shared<MemoryCollection<host::ConNotes>>();
+}
+Ref<host::Order> MemoryHost::NewOrder() {
+  auto o = std::make_shared<MemoryObject<host::Order>>("Order");
+  AddMethods(*this, *o);
+  return o;
+}
+Ref<host::Pack> MemoryHost::NewPack() {
+  auto o = std::make_shared<MemoryObject<host::Pack>>("Pack");
+  AddMethods(*this, *o);
+  return o;
+}
+
+}  // namespace quendal::test

@@ -1,0 +1,150 @@
+#include "platform/DirectorySpooler.h"
+
+#include <algorithm>
+#include <cctype>
+#include <cstdio>
+#include <filesystem>
+
+#include "frame/Error.h"
+#include "frame/VB.h"
+#include "platform/FileSystem.h"
+
+namespace quendal {
+
+namespace fs = std::filesystem;
+
+namespace {
+
+// A job file: six digits, "-", the document name.
+bool IsJobFile(const std::string& name) {
+  if (name.size() < 8 || name[6] != '-') return false;
+  return std::all_of(name.begin(), name.begin() + 6,
+                     [](char c) { return std::isdigit(static_cast<unsigned char>(c)); });
+}
+
+}  // namespace
+
+std::string SafeFileName(std::string_view name) {
+  std::string out;
+  for (unsigned char c : name) {
+    const bool bad = c < 0x20 || c == '/' || c == '\\' || c == ':' || c == '*' || c == '?' ||
+                     c == '"' || c == '<' || c == '>' || c == '|' || c == 0x7F;
+    out += bad ? '_' : static_cast<char>(c);
+  }
+  for (std::size_t at; (at = out.find("..")) != std::string::npos;) out.replace(at, 2, "__");
+  if (out.empty()) out = "_";
+  return out;
+}
+
+DirectorySpooler::DirectorySpooler(std::string root) : root_(std::move(root)) {}
+
+std::string DirectorySpooler::PrinterFolder(const std::string& name) const {
+  return (fs::path(root_) / SafeFileName(name)).string();
+}
+
+int DirectorySpooler::Dpi(const std::string& name) const {
+  const auto ini = ReadFile((fs::path(PrinterFolder(name)) / "printer.ini").string());
+  if (!ini) return 300;
+  std::size_t pos = 0;
+  while (pos < ini->size()) {
+    std::size_t end = ini->find('\n', pos);
+    if (end == std::string::npos) end = ini->size();
+    const std::string line = Trim(Replace(ini->substr(pos, end - pos), "\r", ""));
+    if (line.starts_with("dpi=")) {
+      const std::string value = Trim(line.substr(4));
+      if (IsNumericText(value)) {
+        const double dpi = std::strtod(value.c_str(), nullptr);
+        if (dpi >= 50 && dpi <= 2400) return static_cast<int>(dpi);
+      }
+    }
+    pos = end + 1;
+  }
+  return 300;
+}
+
+std::int32_t DirectorySpooler::OpenPrinter(const std::string& name, long& error) {
+  error = 0;
+  if (name.empty() || SafeFileName(name) != name || !FolderExists(PrinterFolder(name))) {
+    error = err::kUnknownPrinter;
+    return 0;
+  }
+  const std::int32_t handle = nextHandle_++;
+  open_[handle] = Open{name, {}, {}, 0};
+  return handle;
+}
+
+std::string DirectorySpooler::NextJobPath(const std::string& name, const std::string& documentName,
+                                          const std::string& extension) {
+  const std::string folder = PrinterFolder(name);
+  // The counter file keeps numbers rising even after the printer took its jobs away.
+  const std::string counterPath = (fs::path(folder) / ".jobcounter").string();
+  long next = 1;
+  if (auto counter = ReadFile(counterPath); counter && IsNumericText(*counter))
+    next = std::strtol(counter->c_str(), nullptr, 10) + 1;
+  if (auto files = ListFiles(folder)) {
+    for (const auto& f : *files)
+      if (IsJobFile(f.name)) next = std::max(next, std::strtol(f.name.c_str(), nullptr, 10) + 1);
+  }
+  if (next > 999999) next = 1;
+  ReplaceFile(counterPath, std::to_string(next));
+  char number[32];
+  std::snprintf(number, sizeof number, "%06ld", next);
+  return (fs::path(folder) / (std::string(number) + "-" + SafeFileName(documentName) + "." + extension))
+      .string();
+}
+
+std::int32_t DirectorySpooler::StartDoc(std::int32_t handle, const std::string& documentName) {
+  auto it = open_.find(handle);
+  if (it == open_.end()) return 0;
+  it->second.document = documentName.empty() ? "document" : documentName;
+  it->second.bytes.clear();
+  it->second.job = ++jobSerial_;
+  return it->second.job;
+}
+
+bool DirectorySpooler::Write(std::int32_t handle, std::string_view bytes) {
+  auto it = open_.find(handle);
+  if (it == open_.end() || it->second.document.empty()) return false;
+  it->second.bytes.append(bytes);
+  return true;
+}
+
+bool DirectorySpooler::EndDoc(std::int32_t handle) {
+  auto it = open_.find(handle);
+  if (it == open_.end() || it->second.document.empty()) return false;
+  Open& doc = it->second;
+  // The job appears whole: written beside the queue, then renamed into it.
+  const bool ok = ReplaceFile(NextJobPath(doc.printer, doc.document, "prn"), doc.bytes);
+  doc.document.clear();
+  doc.bytes.clear();
+  return ok;
+}
+
+void DirectorySpooler::ClosePrinter(std::int32_t handle) { open_.erase(handle); }
+
+std::int32_t DirectorySpooler::JobCount(std::int32_t handle, std::int32_t limit) {
+  auto it = open_.find(handle);
+  if (it == open_.end()) return 0;
+  const auto files = ListFiles(PrinterFolder(it->second.printer));
+  if (!files) return 0;
+  std::int32_t count = 0;
+  for (const auto& f : *files)
+    if (IsJobFile(f.name) && ++count >= limit) break;
+  return count;
+}
+
+std::vector<InstalledPrinter> DirectorySpooler::InstalledPrinters() {
+  std::vector<InstalledPrinter> printers;
+  std::error_code ec;
+  for (const auto& entry : fs::directory_iterator(root_, ec)) {
+    if (!entry.is_directory(ec)) continue;
+    const std::string name = entry.path().filename().string();
+    const double dpi = Dpi(name);
+    printers.push_back({name, 1440.0 / dpi, 1440.0 / dpi});
+  }
+  std::sort(printers.begin(), printers.end(),
+            [](const InstalledPrinter& a, const InstalledPrinter& b) { return a.name < b.name; });
+  return printers;
+}
+
+}  // namespace quendal

@@ -1,0 +1,53 @@
+// The embedded default spooler: printer NAME is the folder SPOOL/NAME/ (it
+// exists = it is installed); each job is one file
+// SPOOL/NAME/NNNNNN-<document name>.prn holding the bytes as sent; the
+// queue length is the number of job files. SPOOL/NAME/printer.ini may set
+// dpi= (default 300).
+#pragma once
+
+#include <map>
+#include <string>
+
+#include "platform/Spooler.h"
+
+namespace quendal {
+
+class DirectorySpooler : public Spooler {
+ public:
+  explicit DirectorySpooler(std::string root);
+
+  std::int32_t OpenPrinter(const std::string& name, long& error) override;
+  std::int32_t StartDoc(std::int32_t handle, const std::string& documentName) override;
+  bool Write(std::int32_t handle, std::string_view bytes) override;
+  bool EndDoc(std::int32_t handle) override;
+  void ClosePrinter(std::int32_t handle) override;
+  std::int32_t JobCount(std::int32_t handle, std::int32_t limit) override;
+  std::vector<InstalledPrinter> InstalledPrinters() override;
+
+  const std::string& Root() const { return root_; }
+  // The folder of a printer.
+  std::string PrinterFolder(const std::string& name) const;
+  // The printer's resolution from printer.ini (dpi=, default 300).
+  int Dpi(const std::string& name) const;
+  // Reserves the next job file name "NNNNNN-<document>.<extension>" in a printer's folder.
+  std::string NextJobPath(const std::string& name, const std::string& documentName,
+                          const std::string& extension);
+
+ private:
+  struct Open {
+    std::string printer;
+    std::string document;  // empty when no document is started
+    std::string bytes;
+    std::int32_t job = 0;
+  };
+  std::string root_;
+  std::map<std::int32_t, Open> open_;
+  std::int32_t nextHandle_ = 1;
+  std::int32_t jobSerial_ = 0;
+};
+
+// A file name made safe: path separators, "..", control characters and
+// characters that file systems refuse become "_".
+std::string SafeFileName(std::string_view name);
+
+}  // namespace quendal

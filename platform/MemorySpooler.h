@@ -1,0 +1,44 @@
+// A spooler in memory, for tests and benchmarks: printers are declared,
+// jobs are kept with their bytes, and the queue length can be scripted.
+#pragma once
+
+#include <functional>
+#include <map>
+#include <string>
+#include <vector>
+
+#include "platform/Spooler.h"
+
+namespace quendal {
+
+class MemorySpooler : public Spooler {
+ public:
+  struct Job {
+    std::string printer;
+    std::string document;
+    std::string bytes;
+  };
+
+  void AddPrinter(const std::string& name, int dpi = 300);
+
+  std::int32_t OpenPrinter(const std::string& name, long& error) override;
+  std::int32_t StartDoc(std::int32_t handle, const std::string& documentName) override;
+  bool Write(std::int32_t handle, std::string_view bytes) override;
+  bool EndDoc(std::int32_t handle) override;
+  void ClosePrinter(std::int32_t handle) override;
+  std::int32_t JobCount(std::int32_t handle, std::int32_t limit) override;
+  std::vector<InstalledPrinter> InstalledPrinters() override;
+
+  std::vector<Job> jobs;  // finished jobs, in order
+  // When set, answers the queue length instead of counting jobs; called once per question.
+  std::function<std::int32_t(const std::string& printer)> queueLength;
+  int opens = 0;
+
+ private:
+  std::map<std::string, int> printers_;
+  std::map<std::int32_t, Job> open_;
+  std::map<std::int32_t, bool> started_;
+  std::int32_t nextHandle_ = 1;
+};
+
+}  // namespace quendal

@@ -1,0 +1,78 @@
+#include "platform/DirectorySpooler.h"
+
+#include <gtest/gtest.h>
+
+#include <filesystem>
+
+#include "frame/Error.h"
+#include "platform/FileSystem.h"
+
+namespace quendal {
+namespace {
+
+namespace fs = std::filesystem;
+
+class DirectorySpoolerTest : public ::testing::Test {
+ protected:
+  void SetUp() override {
+    root = fs::temp_directory_path() / ("quendal-spool-" + std::to_string(::getpid()));
+    fs::remove_all(root);
+    fs::create_directories(root / "Dock Zebra");
+  }
+  void TearDown() override { fs::remove_all(root); }
+  fs::path root;
+};
+
+TEST_F(DirectorySpoolerTest, OneFilePerJobWithTheBytesAsSent) {
+  DirectorySpooler spooler(root.string());
+  long error = -1;
+  const auto h = spooler.OpenPrinter("Dock Zebra", error);
+  ASSERT_NE(h, 0);
+  EXPECT_EQ(error, 0);
+  EXPECT_EQ(spooler.JobCount(h, 999), 0);
+  ASSERT_NE(spooler.StartDoc(h, "Quendal.clsStarTrackGenericSCM"), 0);
+  ASSERT_TRUE(spooler.Write(h, "{B,430,N,1|"));
+  ASSERT_TRUE(spooler.Write(h, std::string("\xC8}", 2)));
+  EXPECT_EQ(spooler.JobCount(h, 999), 0);  // not queued until the document ends
+  ASSERT_TRUE(spooler.EndDoc(h));
+  ASSERT_NE(spooler.StartDoc(h, "a/../b"), 0);
+  ASSERT_TRUE(spooler.EndDoc(h));
+  EXPECT_EQ(spooler.JobCount(h, 999), 2);
+  EXPECT_EQ(spooler.JobCount(h, 1), 1);
+  spooler.ClosePrinter(h);
+  EXPECT_EQ(*ReadFile((root / "Dock Zebra/000001-Quendal.clsStarTrackGenericSCM.prn").string()),
+            "{B,430,N,1|\xC8}");
+  EXPECT_TRUE(FileExists((root / "Dock Zebra/000002-a____b.prn").string()));
+  EXPECT_FALSE(spooler.Write(h, "x"));  // closed
+}
+
+TEST_F(DirectorySpoolerTest, UnknownPrintersAreError1801) {
+  DirectorySpooler spooler(root.string());
+  for (const char* name : {"Nowhere", "", "../Dock Zebra", "dock zebra"}) {
+    long error = 0;
+    EXPECT_EQ(spooler.OpenPrinter(name, error), 0) << name;
+    EXPECT_EQ(error, err::kUnknownPrinter);
+  }
+}
+
+TEST_F(DirectorySpoolerTest, InstalledPrintersCarryTheirResolution) {
+  fs::create_directories(root / "Office Laser");
+  ASSERT_TRUE(AppendFile((root / "Office Laser/printer.ini").string(), "[printer]\r\ndpi=203\r\n"));
+  DirectorySpooler spooler(root.string());
+  const auto printers = spooler.InstalledPrinters();
+  ASSERT_EQ(printers.size(), 2u);
+  EXPECT_EQ(printers[0].name, "Dock Zebra");
+  EXPECT_DOUBLE_EQ(printers[0].twipsPerPixelX, 4.8);
+  EXPECT_EQ(printers[1].name, "Office Laser");
+  EXPECT_DOUBLE_EQ(printers[1].twipsPerPixelY, 1440.0 / 203);
+}
+
+TEST(SafeFileNameTest, KeepsNamesInsideTheFolder) {
+  EXPECT_EQ(SafeFileName("SRX04521.CLN"), "SRX04521.CLN");
+  EXPECT_EQ(SafeFileName("../../etc/passwd"), "______etc_passwd");
+  EXPECT_EQ(SafeFileName("a\\b:c"), "a_b_c");
+  EXPECT_EQ(SafeFileName(""), "_");
+}
+
+}  // namespace
+}  // namespace quendal

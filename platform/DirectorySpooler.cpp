@@ -2,11 +2,13 @@
 
 #include <algorithm>
 #include <cctype>
+#include <cmath>
 #include <cstdio>
 #include <filesystem>
 
 #include "frame/Error.h"
 #include "frame/VB.h"
+#include "platform/CairoCanvas.h"
 #include "platform/FileSystem.h"
 
 namespace quendal {
@@ -42,24 +44,38 @@ std::string DirectorySpooler::PrinterFolder(const std::string& name) const {
   return (fs::path(root_) / SafeFileName(name)).string();
 }
 
-int DirectorySpooler::Dpi(const std::string& name) const {
+double DirectorySpooler::Setting(const std::string& name, std::string_view key, double fallback,
+                                 double low, double high) const {
   const auto ini = ReadFile((fs::path(PrinterFolder(name)) / "printer.ini").string());
-  if (!ini) return 300;
+  if (!ini) return fallback;
+  const std::string prefix = std::string(key) + "=";
   std::size_t pos = 0;
   while (pos < ini->size()) {
     std::size_t end = ini->find('\n', pos);
     if (end == std::string::npos) end = ini->size();
     const std::string line = Trim(Replace(ini->substr(pos, end - pos), "\r", ""));
-    if (line.starts_with("dpi=")) {
-      const std::string value = Trim(line.substr(4));
+    if (line.starts_with(prefix)) {
+      const std::string value = Trim(line.substr(prefix.size()));
       if (IsNumericText(value)) {
-        const double dpi = std::strtod(value.c_str(), nullptr);
-        if (dpi >= 50 && dpi <= 2400) return static_cast<int>(dpi);
+        const double v = std::strtod(value.c_str(), nullptr);
+        if (v >= low && v <= high) return v;
       }
     }
     pos = end + 1;
   }
-  return 300;
+  return fallback;
+}
+
+int DirectorySpooler::Dpi(const std::string& name) const {
+  return static_cast<int>(Setting(name, "dpi", 300, 50, 2400));
+}
+
+double DirectorySpooler::PageWidthMm(const std::string& name) const {
+  return Setting(name, "width_mm", 100, 10, 1000);
+}
+
+double DirectorySpooler::PageHeightMm(const std::string& name) const {
+  return Setting(name, "height_mm", 150, 10, 1000);
 }
 
 std::int32_t DirectorySpooler::OpenPrinter(const std::string& name, long& error) {
@@ -145,6 +161,63 @@ std::vector<InstalledPrinter> DirectorySpooler::InstalledPrinters() {
   std::sort(printers.begin(), printers.end(),
             [](const InstalledPrinter& a, const InstalledPrinter& b) { return a.name < b.name; });
   return printers;
+}
+
+namespace {
+
+// Pages drawn in memory, written as one PNG job file each when the document ends.
+class DirectoryDC : public DeviceContext {
+ public:
+  DirectoryDC(DirectorySpooler& spooler, std::string printer)
+      : spooler_(spooler), printer_(std::move(printer)) {
+    const int dpi = spooler_.Dpi(printer_);
+    canvas_ = std::make_unique<PngCanvas>(
+        static_cast<int>(std::lround(spooler_.PageWidthMm(printer_) / 25.4 * dpi)),
+        static_cast<int>(std::lround(spooler_.PageHeightMm(printer_) / 25.4 * dpi)), dpi);
+  }
+  bool StartDoc(const std::string& documentName) override {
+    document_ = documentName.empty() ? "document" : documentName;
+    return true;
+  }
+  bool EndDoc() override {
+    if (document_.empty()) return false;
+    if (pageOpen_) EndPage();
+    bool ok = true;
+    for (const std::string& page : canvas_->Pages())
+      ok = ReplaceFile(spooler_.NextJobPath(printer_, document_, "png"), page) && ok;
+    document_.clear();
+    return ok;
+  }
+  void StartPage() override {
+    canvas_->StartPage();
+    pageOpen_ = true;
+  }
+  void EndPage() override {
+    canvas_->EndPage();
+    pageOpen_ = false;
+  }
+  void Rectangle(int x1, int y1, int x2, int y2, int penWidth) override {
+    canvas_->Rectangle(x1, y1, x2, y2, penWidth);
+  }
+  void Text(int x, int y, std::string_view utf8, const CanvasFont& font, Colour text,
+            Colour background) override {
+    canvas_->Text(x, y, utf8, font, text, background);
+  }
+
+ private:
+  DirectorySpooler& spooler_;
+  std::string printer_;
+  std::string document_;
+  std::unique_ptr<PngCanvas> canvas_;
+  bool pageOpen_ = false;
+};
+
+}  // namespace
+
+std::unique_ptr<DeviceContext> DirectorySpooler::CreateDC(const std::string& printer) {
+  if (printer.empty() || SafeFileName(printer) != printer || !FolderExists(PrinterFolder(printer)))
+    return nullptr;
+  return std::make_unique<DirectoryDC>(*this, printer);
 }
 
 }  // namespace quendal

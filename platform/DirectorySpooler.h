@@ -23,17 +23,25 @@ class DirectorySpooler : public Spooler {
   void ClosePrinter(std::int32_t handle) override;
   std::int32_t JobCount(std::int32_t handle, std::int32_t limit) override;
   std::vector<InstalledPrinter> InstalledPrinters() override;
+  std::unique_ptr<DeviceContext> CreateDC(const std::string& printer) override;
 
   const std::string& Root() const { return root_; }
   // The folder of a printer.
   std::string PrinterFolder(const std::string& name) const;
   // The printer's resolution from printer.ini (dpi=, default 300).
   int Dpi(const std::string& name) const;
+  // The page of a drawn printer in millimetres (printer.ini width_mm=, height_mm=; default a
+  // 100 x 150 mm label).
+  double PageWidthMm(const std::string& name) const;
+  double PageHeightMm(const std::string& name) const;
   // Reserves the next job file name "NNNNNN-<document>.<extension>" in a printer's folder.
   std::string NextJobPath(const std::string& name, const std::string& documentName,
                           const std::string& extension);
 
  private:
+  // A number from printer.ini within [low, high], else `fallback`.
+  double Setting(const std::string& name, std::string_view key, double fallback, double low,
+                 double high) const;
   struct Open {
     std::string printer;
     std::string document;  // empty when no document is started

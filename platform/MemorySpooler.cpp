@@ -68,4 +68,41 @@ std::vector<InstalledPrinter> MemorySpooler::InstalledPrinters() {
   return out;
 }
 
+namespace {
+
+class MemoryDC : public DeviceContext {
+ public:
+  explicit MemoryDC(std::shared_ptr<MemorySpooler::DrawnJob> job) : job_(std::move(job)) {}
+  bool StartDoc(const std::string& documentName) override {
+    job_->document = documentName;
+    return true;
+  }
+  bool EndDoc() override {
+    job_->ended = true;
+    return true;
+  }
+  void StartPage() override { job_->canvas.StartPage(); }
+  void EndPage() override { job_->canvas.EndPage(); }
+  void Rectangle(int x1, int y1, int x2, int y2, int penWidth) override {
+    job_->canvas.Rectangle(x1, y1, x2, y2, penWidth);
+  }
+  void Text(int x, int y, std::string_view utf8, const CanvasFont& font, Colour text,
+            Colour background) override {
+    job_->canvas.Text(x, y, utf8, font, text, background);
+  }
+
+ private:
+  std::shared_ptr<MemorySpooler::DrawnJob> job_;
+};
+
+}  // namespace
+
+std::unique_ptr<DeviceContext> MemorySpooler::CreateDC(const std::string& printer) {
+  if (!printers_.contains(printer)) return nullptr;
+  auto job = std::make_shared<DrawnJob>();
+  job->printer = printer;
+  drawnJobs.push_back(job);
+  return std::make_unique<MemoryDC>(job);
+}
+
 }  // namespace quendal

@@ -4,9 +4,11 @@
 
 #include <functional>
 #include <map>
+#include <memory>
 #include <string>
 #include <vector>
 
+#include "platform/RecordingCanvas.h"
 #include "platform/Spooler.h"
 
 namespace quendal {
@@ -28,8 +30,18 @@ class MemorySpooler : public Spooler {
   void ClosePrinter(std::int32_t handle) override;
   std::int32_t JobCount(std::int32_t handle, std::int32_t limit) override;
   std::vector<InstalledPrinter> InstalledPrinters() override;
+  std::unique_ptr<DeviceContext> CreateDC(const std::string& printer) override;
+
+  // A drawn job: what was drawn on it, page by page.
+  struct DrawnJob {
+    std::string printer;
+    std::string document;
+    RecordingCanvas canvas;
+    bool ended = false;
+  };
 
   std::vector<Job> jobs;  // finished jobs, in order
+  std::vector<std::shared_ptr<DrawnJob>> drawnJobs;
   // When set, answers the queue length instead of counting jobs; called once per question.
   std::function<std::int32_t(const std::string& printer)> queueLength;
   int opens = 0;

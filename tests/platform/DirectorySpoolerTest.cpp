@@ -67,6 +67,31 @@ TEST_F(DirectorySpoolerTest, InstalledPrintersCarryTheirResolution) {
   EXPECT_DOUBLE_EQ(printers[1].twipsPerPixelY, 1440.0 / 203);
 }
 
+TEST_F(DirectorySpoolerTest, DrawnJobsArePngPagesAtThePrintersResolution) {
+  ASSERT_TRUE(AppendFile((root / "Dock Zebra/printer.ini").string(),
+                         "dpi=203\nwidth_mm=50.8\nheight_mm=25.4\n"));
+  DirectorySpooler spooler(root.string());
+  EXPECT_FALSE(spooler.CreateDC("dock zebra"));  // names are exact
+  auto dc = spooler.CreateDC("Dock Zebra");
+  ASSERT_TRUE(dc);
+  ASSERT_TRUE(dc->StartDoc("Quendal.clsStarTrackGenericSCM"));
+  for (int page = 0; page < 2; ++page) {
+    dc->StartPage();
+    dc->Rectangle(10, 10, 50, 50, 2);
+    dc->EndPage();
+  }
+  ASSERT_TRUE(dc->EndDoc());
+  long error = 0;
+  const auto h = spooler.OpenPrinter("Dock Zebra", error);
+  EXPECT_EQ(spooler.JobCount(h, 999), 2);
+  const auto png = ReadFile((root / "Dock Zebra/000002-Quendal.clsStarTrackGenericSCM.png").string());
+  ASSERT_TRUE(png);
+  // 2 x 1 inches at 203 dpi.
+  EXPECT_EQ(static_cast<unsigned char>((*png)[19]), 406 % 256);
+  EXPECT_EQ(static_cast<unsigned char>((*png)[18]), 406 / 256);
+  EXPECT_EQ(static_cast<unsigned char>((*png)[23]), 203);
+}
+
 TEST(SafeFileNameTest, KeepsNamesInsideTheFolder) {
   EXPECT_EQ(SafeFileName("SRX04521.CLN"), "SRX04521.CLN");
   EXPECT_EQ(SafeFileName("../../etc/passwd"), "______etc_passwd");

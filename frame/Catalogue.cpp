@@ -5,6 +5,8 @@
 namespace quendal {
 
 // Factories of the built classes, defined beside each class.
+std::unique_ptr<Component> MakeeParcelManifestxml();
+std::unique_ptr<Component> MakeeParcelManifestEODxml();
 
 namespace {
 
@@ -49,7 +51,8 @@ constexpr std::array kCatalogue = {
     CatalogueEntry{"clsIFSAPISCM", Label, "IFS", "any retailer", nullptr},
     CatalogueEntry{"clsIFSDJsSCM", Label, "IFS", "David Jones", nullptr},
     CatalogueEntry{"clsAustPostSCM", Label, "Australia Post", "article-id labels", nullptr},
-    CatalogueEntry{"clseParcelManifestxml", Rows, "Australia Post eParcel", "PCMS manifest", nullptr},
+    CatalogueEntry{"clseParcelManifestxml", Rows, "Australia Post eParcel", "PCMS manifest",
+                   MakeeParcelManifestxml},
     CatalogueEntry{"clsSCMnoSSCC", Label, "any", "label without SSCC", nullptr},
     CatalogueEntry{"clsStarTrackSpotlightSCM", Label, "StarTrack", "Spotlight", nullptr},
     CatalogueEntry{"clsStarTrackBigWERSCM", Label, "StarTrack", "BigW", nullptr},
@@ -69,7 +72,7 @@ constexpr std::array kCatalogue = {
     CatalogueEntry{"clsAustPostDespatchSCM", Label, "Australia Post", "despatch article-id labels",
                    nullptr},
     CatalogueEntry{"clseParcelManifestEODxml", Rows, "Australia Post eParcel", "PCMS end of day",
-                   nullptr},
+                   MakeeParcelManifestEODxml},
     CatalogueEntry{"clsTollDJsSCM", Label, "Toll", "David Jones", nullptr},
 };
 static_assert(kCatalogue.size() == 48);

@@ -1,6 +1,7 @@
 #include "manifests/eParcelRows.h"
 
 #include <array>
+#include <cstdint>
 
 #include "frame/VB.h"
 #include "labels/WinPrint.h"
@@ -129,7 +130,9 @@ std::int32_t eParcelRows::ProcessRow(Procedure& proc, const Ref<host::ConNote>& 
     return result;
   if (!proc([&] {
         vtErrorLog = {LastLogId()};
-        result = static_cast<std::int32_t>(conNote->ConNoteId().NumberOr(0));
+        const double id = conNote->ConNoteId().NumberOr(0);
+        // An id the 32-bit result cannot hold is no id the host could look up.
+        if (id >= INT32_MIN && id <= INT32_MAX) result = static_cast<std::int32_t>(id);
       }))
     return result;
   return result;

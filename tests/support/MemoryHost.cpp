@@ -154,7 +154,12 @@ MemoryHost::MemoryHost() : self_(std::shared_ptr<host::Library>(this, [](host::L
   previous_ = host::RegisterLibrary(self_);
 }
 
-MemoryHost::~MemoryHost() { host::RegisterLibrary(previous_); }
+MemoryHost::~MemoryHost() {
+  // Attach links consignments and packs both ways; undo that so neither outlives the host.
+  for (const auto& conNote : conNotes) conNote->fields.clear();
+  for (const auto& pack : packs) pack->fields.clear();
+  host::RegisterLibrary(previous_);
+}
 
 std::vector<std::string> MemoryHost::LogMessages() const {
   std::vector<std::string> out;

@@ -152,6 +152,7 @@ bool eParcelRows::TermWork(Procedure& proc) {
   if (!proc([&] { written = pcms::WriteDayFile(target, *document_); })) return false;
   // Nothing written: the run's consignments stay for another Term.
   if (written.path.empty()) return false;
+  document_.reset();
   for (const std::string& kept : written.unreadable) {
     if (!proc([&] {
           WriteLog(0, "Term",
@@ -162,7 +163,6 @@ bool eParcelRows::TermWork(Procedure& proc) {
         }))
       return false;
   }
-  document_.reset();
   return true;
 }
 

@@ -221,7 +221,10 @@ void Document::AppendConsignmentsOf(const Document& other) {
 }
 
 std::string Document::FileText() const {
-  std::string out = "<?xml version=\"1.0\" encoding=\"utf-8\"?>\r\n<PCMS xmlns=\"";
+  std::string out;
+  // About 2 KB a consignment: one allocation for a day's file instead of many.
+  out.reserve(1024 + ConsignmentCount() * 2560);
+  out += "<?xml version=\"1.0\" encoding=\"utf-8\"?>\r\n<PCMS xmlns=\"";
   out += kNamespace;
   out += "\">\r\n";
   CrLfWriter writer(out);

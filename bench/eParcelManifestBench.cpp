@@ -43,7 +43,8 @@ class Warehouse {
     despatch_ = host.Make<host::Despatch>({{"DespatchNo", "PO778812"}});
     carton_ = host.Make<host::Carton>({{"Length", 0.40}, {"Width", 0.30}, {"Height", 0.25}});
     auto address = host.Make<host::Address>({{"Company", "Harbour Stores Ltd"}});
-    customer_ = host.Make<host::Customer>({{"Name", "Harbour Stores Online"}, {"Address", address}});
+    customer_ =
+        host.Make<host::Customer>({{"Name", "Harbour Stores Online"}, {"Address", address}});
   }
   ~Warehouse() { fs::remove_all(dir_); }
 
@@ -72,8 +73,9 @@ class Warehouse {
                                                {"Vendor", vendor_},
                                                {"Carrier", carrier_},
                                                {"Orders", MemoryHost::List<host::Order>({order})}});
-      MemoryHost::Attach(conNote, {host.Make<host::Pack>(
-                                      {{"Order", order}, {"Despatch", despatch_}, {"Carton", carton_}})});
+      MemoryHost::Attach(conNote,
+                         {host.Make<host::Pack>(
+                             {{"Order", order}, {"Despatch", despatch_}, {"Carton", carton_}})});
     }
   }
 

@@ -65,8 +65,7 @@ std::string TransactionTime(const DateTime& at) {
 }
 
 std::string CreatedTime(const Var& conNoteDate) {
-  return Format(conNoteDate, "yyyy-mm-dd") + "T" + Format(conNoteDate, "hh:mm:ss") +
-         ".106+10:00";
+  return Format(conNoteDate, "yyyy-mm-dd") + "T" + Format(conNoteDate, "hh:mm:ss") + ".106+10:00";
 }
 
 namespace {
@@ -144,8 +143,7 @@ void Store(const std::string& path, const std::string& bytes) {
 
 std::string Beside(const std::string& path, int n) {
   const fs::path p(path);
-  return (p.parent_path() /
-          (p.stem().string() + "_" + std::to_string(n) + p.extension().string()))
+  return (p.parent_path() / (p.stem().string() + "_" + std::to_string(n) + p.extension().string()))
       .string();
 }
 

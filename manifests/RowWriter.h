@@ -54,7 +54,8 @@ class RowWriter : public virtual RowInterface, public Lifecycle {
 
   // The consignments awaiting a manifest for the document's vendor and carrier.
   Ref<host::ConNotes> ManifestConNotes();
-  // Today's consignments (today up to, not including, tomorrow) of the document's vendor and carrier.
+  // Today's consignments (today up to, not including, tomorrow) of the document's vendor and
+  // carrier.
   Ref<host::ConNotes> TodaysConNotes();
   // Gives the run's manifest record its vendor, carrier and date and saves
   // it, once per object; true when the record has an id.

@@ -170,8 +170,8 @@ void eParcelRows::StartDocument(const Ref<host::ConNote>& conNote) {
   // Built aside and kept only when whole.
   auto document = std::make_unique<pcms::Document>();
   CreatePCMSHeader(document->SendPCMSManifest(), conNote);
-  pugi::xml_node manifest = document->SendPCMSManifest().append_child("body").append_child(
-      "PCMSManifest");
+  pugi::xml_node manifest =
+      document->SendPCMSManifest().append_child("body").append_child("PCMSManifest");
   pcms::AppendText(manifest, "MerchantLocationId", carrier_->AccountRef().Text());
   pcms::AppendText(manifest, "ManifestNumber", manifestNumber_);
   const std::string now = pcms::TransactionTime(Now());
@@ -181,8 +181,8 @@ void eParcelRows::StartDocument(const Ref<host::ConNote>& conNote) {
 }
 
 std::string eParcelRows::DayFileName() {
-  return NamePart(Left(UCase(carrier_->AccountRef().Text()), 4)) + "_" +
-         NamePart(manifestNumber_) + "_" + NamePart(carrier_->Options().Text()) + ".xml";
+  return NamePart(Left(UCase(carrier_->AccountRef().Text()), 4)) + "_" + NamePart(manifestNumber_) +
+         "_" + NamePart(carrier_->Options().Text()) + ".xml";
 }
 
 std::optional<std::string> eParcelRows::TodaysFile() {
@@ -198,7 +198,8 @@ std::optional<std::string> eParcelRows::TodaysFile() {
 
 void eParcelRows::CreateContentsItem(pugi::xml_node parentNode) { AppendContentsItem(parentNode); }
 
-void eParcelRows::CreatePCMSHeader(pugi::xml_node parentNode, const Ref<host::ConNote>& objConNote) {
+void eParcelRows::CreatePCMSHeader(pugi::xml_node parentNode,
+                                   const Ref<host::ConNote>& objConNote) {
   Ref<host::Despatch> despatch = objConNote->Packs()->Item(1)->Despatch();
   const std::string transactionId = despatch ? despatch->DespatchNo().Text() : std::string();
   pugi::xml_node header = parentNode.append_child("header");

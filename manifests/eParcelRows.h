@@ -5,10 +5,9 @@
 
 #include <memory>
 #include <optional>
+#include <pugixml.hpp>
 #include <string>
 #include <vector>
-
-#include <pugixml.hpp>
 
 #include "manifests/PcmsDocument.h"
 #include "manifests/RowWriter.h"
@@ -63,9 +62,9 @@ class eParcelRows : public RowWriter {
   // Every value of one PCMSConsignment, read from the host before any
   // element is made, so a failing host read never leaves half a consignment.
   struct Consignment {
-    std::optional<std::string> number, chargeCode, reference, deliveryName, company, email,
-        line1, line2, phone, emailAddress, suburb, state, postcode, returnName, returnLine1,
-        returnSuburb, returnState, returnPostcode, returnCountry, created, postCharge;
+    std::optional<std::string> number, chargeCode, reference, deliveryName, company, email, line1,
+        line2, phone, emailAddress, suburb, state, postcode, returnName, returnLine1, returnSuburb,
+        returnState, returnPostcode, returnCountry, created, postCharge;
     std::string weight;
     std::vector<Article> articles;
   };
@@ -82,7 +81,8 @@ class eParcelRows : public RowWriter {
                       const std::string& postcode);
   std::optional<std::string> DeliveryCompany(const Ref<host::Pack>& firstPack);
   static void AppendConsignment(pugi::xml_node parent, const Consignment& values);
-  static void AppendArticle(pugi::xml_node parent, const Article& article, const std::string& weight);
+  static void AppendArticle(pugi::xml_node parent, const Article& article,
+                            const std::string& weight);
 
   // Makes the run's document: header, body and the PCMSManifest fields.
   void StartDocument(const Ref<host::ConNote>& conNote);

@@ -1,8 +1,7 @@
-#include "manifests/PcmsDocument.h"
-
 #include <gtest/gtest.h>
 
 #include "labels/WinPrint.h"
+#include "manifests/PcmsDocument.h"
 
 namespace quendal::pcms {
 namespace {
@@ -31,15 +30,18 @@ TEST(PcmsValuesTest, WeightsCountriesAndNotification) {
 
 TEST(PcmsValuesTest, ElementTextIsAlwaysWellFormed) {
   EXPECT_EQ(XmlText("a\tb\r\nc\x01"), "a b  c ");
-  EXPECT_EQ(XmlText("\xC3"), "\xEF\xBF\xBD");                  // cut sequence
-  EXPECT_EQ(XmlText("\xC0\xAF"), "\xEF\xBF\xBD\xEF\xBF\xBD");  // overlong "/"
+  EXPECT_EQ(XmlText("\xC3"), "\xEF\xBF\xBD");                                  // cut sequence
+  EXPECT_EQ(XmlText("\xC0\xAF"), "\xEF\xBF\xBD\xEF\xBF\xBD");                  // overlong "/"
   EXPECT_EQ(XmlText("\xED\xA0\x80"), "\xEF\xBF\xBD\xEF\xBF\xBD\xEF\xBF\xBD");  // surrogate
   EXPECT_EQ(XmlText("\xF0\x9F\x93\xA6"), "\xF0\x9F\x93\xA6");
 }
 
 TEST(PcmsDocumentTest, ReadsWrappedAndBareTreesAndRefusesOthers) {
   Document run;
-  run.SendPCMSManifest().append_child("body").append_child("PCMSManifest").append_child("PCMSConsignment");
+  run.SendPCMSManifest()
+      .append_child("body")
+      .append_child("PCMSManifest")
+      .append_child("PCMSConsignment");
   auto wrapped = Document::Parse(run.FileText());
   ASSERT_TRUE(wrapped);
   EXPECT_EQ(wrapped->FileText(), run.FileText());  // reading and writing again changes nothing

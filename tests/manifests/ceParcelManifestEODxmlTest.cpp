@@ -1,7 +1,6 @@
-#include "manifests/ceParcelManifestEODxml.h"
-
 #include <gtest/gtest.h>
 
+#include "manifests/ceParcelManifestEODxml.h"
 #include "tests/manifests/eParcelFixture.h"
 
 namespace quendal {
@@ -20,7 +19,8 @@ class eParcelEndOfDayTest : public test::eParcelFixture {
 
 TEST_F(eParcelEndOfDayTest, TodaysConsignmentsGoOutWithOneArticleAndNoManifestRecord) {
   auto today = AddConNote(201, "NPP0000201", 3, JSmith());
-  AddConNote(202, "NPP0000202", 1, JSmith(), {{"ConNoteDate", DateTime::FromParts(2024, 3, 13, 23, 59, 59)}});
+  AddConNote(202, "NPP0000202", 1, JSmith(),
+             {{"ConNoteDate", DateTime::FromParts(2024, 3, 13, 23, 59, 59)}});
   AddConNote(203, "NPP0000203", 1, JSmith(), {{"ManifestId", 5}});
 
   auto object = CreateObject(kEndOfDayClass).object;
@@ -53,7 +53,8 @@ TEST_F(eParcelEndOfDayTest, EachRunLooksForTheDayFileWhereItsClassKeepsIt) {
   AddConNote(302, "NPP0000302", 1, JSmith());
   Run("Quendal.clseParcelManifestxml", {0});
   Run(kEndOfDayClass, {1});
-  EXPECT_EQ(Values("NPP1_1000_EP.xml", "//ConsignmentNumber"), (Strings{"NPP10000301", "NPP10000302"}));
+  EXPECT_EQ(Values("NPP1_1000_EP.xml", "//ConsignmentNumber"),
+            (Strings{"NPP10000301", "NPP10000302"}));
   Run("Quendal.clseParcelManifestxml", {0});
   EXPECT_EQ(FilesInFolder(), (Strings{"NPP1_1000_EP.xml", "NPP1_1001_EP.xml", "edi"}));
 }

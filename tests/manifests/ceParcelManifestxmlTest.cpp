@@ -1,7 +1,6 @@
-#include "manifests/ceParcelManifestxml.h"
-
 #include <gtest/gtest.h>
 
+#include "manifests/ceParcelManifestxml.h"
 #include "tests/manifests/eParcelFixture.h"
 
 namespace quendal {
@@ -16,22 +15,36 @@ class eParcelManifestTest : public test::eParcelFixture {
  protected:
   // J SMITH, express; the delivery address has a phone and an e-mail.
   std::shared_ptr<test::MemoryObject<host::ConNote>> ExpressToJSmith(int packs = 1) {
-    auto order = MakeOrder({{"Name", "J SMITH"}, {"Line1", "5 Sample Street"}, {"Suburb", "RICHMOND"},
-                            {"State", "VIC"}, {"Postcode", "3121"}, {"Phone", " 0400 000 000 "},
-                            {"Email", "j.smith@example.com"}, {"Reference", "WEB-5521"}});
+    auto order = MakeOrder({{"Name", "J SMITH"},
+                            {"Line1", "5 Sample Street"},
+                            {"Suburb", "RICHMOND"},
+                            {"State", "VIC"},
+                            {"Postcode", "3121"},
+                            {"Phone", " 0400 000 000 "},
+                            {"Email", "j.smith@example.com"},
+                            {"Reference", "WEB-5521"}});
     return AddConNote(102, "NPP0000077", packs, order,
-                      {{"Service", "EXPRESS"}, {"ServiceLevel", "EXPRESS"}, {"Weight", 1.2},
+                      {{"Service", "EXPRESS"},
+                       {"ServiceLevel", "EXPRESS"},
+                       {"Weight", 1.2},
                        {"ConNoteDate", DateTime::FromParts(2024, 3, 14, 16, 5, 0)}});
   }
-  // A store, standard service, no weight, no slip line; a second address line, blank phone and e-mail.
+  // A store, standard service, no weight, no slip line; a second address line, blank phone and
+  // e-mail.
   std::shared_ptr<test::MemoryObject<host::ConNote>> StandardToChadstone() {
-    auto order = MakeOrder({{"Name", "Harbour Stores Chadstone"}, {"Line1", "Shop 210"},
-                            {"Line2", "1 Example Parade"}, {"Suburb", "CHADSTONE"}, {"State", "VIC"},
-                            {"Postcode", "3148"}, {"Phone", "  "}, {"Email", "   "},
+    auto order = MakeOrder({{"Name", "Harbour Stores Chadstone"},
+                            {"Line1", "Shop 210"},
+                            {"Line2", "1 Example Parade"},
+                            {"Suburb", "CHADSTONE"},
+                            {"State", "VIC"},
+                            {"Postcode", "3148"},
+                            {"Phone", "  "},
+                            {"Email", "   "},
                             {"Reference", "SO10045"}},
                            false);
-    return AddConNote(103, "NPP0000078", 1, order,
-                      {{"Weight", Var()}, {"ConNoteDate", DateTime::FromParts(2024, 3, 14, 9, 15, 0)}});
+    return AddConNote(
+        103, "NPP0000078", 1, order,
+        {{"Weight", Var()}, {"ConNoteDate", DateTime::FromParts(2024, 3, 14, 9, 15, 0)}});
   }
 };
 
@@ -132,7 +145,6 @@ constexpr std::string_view kTwoRowFile = R"(<?xml version="1.0" encoding="utf-8"
 </PCMS>
 )";
 
-
 // The golden text with every line ended by CR LF, as the file has it.
 std::string Crlf(std::string_view text) {
   std::string out;
@@ -223,7 +235,8 @@ TEST_F(eParcelManifestTest, AnUnreadableDayFileIsKeptAndTheRunGoesBesideIt) {
   EXPECT_EQ(host.LogMessages().back(),
             "Manifest file " + folder +
                 "NPP1_0999_EP.xml cannot be read as a PCMS manifest; it is kept and the "
-                "consignments are written to " + folder + "NPP1_0999_EP_2.xml.");
+                "consignments are written to " +
+                folder + "NPP1_0999_EP_2.xml.");
 }
 
 TEST_F(eParcelManifestTest, AFileThatCannotBeWrittenIsReportedAndKeptForAnotherTerm) {
@@ -264,13 +277,17 @@ TEST_F(eParcelManifestTest, NothingIsWrittenWithoutAConsignmentInTheDocument) {
 }
 
 TEST_F(eParcelManifestTest, HostTextsComeOutEscapedAndWellFormed) {
-  auto order = MakeOrder({{"Name", "Smith & Sons <Pty> \"Ltd\""}, {"Line1", "Café Straße 5\x01\ttab"},
-                          {"Suburb", "M\xFFNCHEN"}, {"Postcode", "3000"}, {"Reference", "]]>"}});
+  auto order = MakeOrder({{"Name", "Smith & Sons <Pty> \"Ltd\""},
+                          {"Line1", "Café Straße 5\x01\ttab"},
+                          {"Suburb", "M\xFFNCHEN"},
+                          {"Postcode", "3000"},
+                          {"Reference", "]]>"}});
   AddConNote(104, "NPP0000079", 1, order);
   Run(kManifestClass, {0});
   const std::string file = "NPP1_1000_EP.xml";
-  EXPECT_NE(FileText(file).find("<DeliveryName>Smith &amp; Sons &lt;Pty&gt; \"Ltd\"</DeliveryName>"),
-            std::string::npos);
+  EXPECT_NE(
+      FileText(file).find("<DeliveryName>Smith &amp; Sons &lt;Pty&gt; \"Ltd\"</DeliveryName>"),
+      std::string::npos);
   EXPECT_FALSE(FileText(file).starts_with("\xEF\xBB\xBF"));  // no byte-order mark
   EXPECT_EQ(Values(file, "//DeliveryName"), Strings{"Smith & Sons <Pty> \"Ltd\""});
   EXPECT_EQ(Values(file, "//DeliveryAddressLine1"), Strings{"Café Straße 5  tab"});
@@ -289,7 +306,8 @@ TEST_F(eParcelManifestTest, FileNamesFromHostTextsStayInTheCarrierFolder) {
 TEST_F(eParcelManifestTest, NullHostDataNeverStopsTheRunNorLeavesHalfAConsignment) {
   // Every scalar Null; a pack without despatch or carton; an order without slip lines.
   auto order = host.Make<host::Order>({{"DeliveryAddress", host.Make<host::Address>()}});
-  auto blank = host.Make<host::ConNote>({{"ConNoteId", 105}, {"Vendor", host.Make<host::Vendor>()},
+  auto blank = host.Make<host::ConNote>({{"ConNoteId", 105},
+                                         {"Vendor", host.Make<host::Vendor>()},
                                          {"Carrier", carrier},
                                          {"Orders", MemoryHost::List<host::Order>({order})}});
   vendor->fields["VendorId"] = Var();

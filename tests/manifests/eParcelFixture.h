@@ -30,11 +30,18 @@ class eParcelFixture : public ::testing::Test {
     std::filesystem::remove_all(dir);
     std::filesystem::create_directories(dir);
     folder = dir.string() + "/";
-    vendor = host.Make<host::Vendor>({{"VendorId", 1}, {"Name", "Acme Apparel Pty Ltd"},
-                                      {"AddressLine1", "Unit 4"}, {"Suburb", "DANDENONG SOUTH"},
-                                      {"State", "VIC"}, {"Postcode", "3175"}, {"Country", "Australia"}});
-    carrier = host.Make<host::Carrier>({{"CarrierId", 2}, {"Options", "EP"}, {"NotifyOptions", "#%noemail"},
-                                        {"AccountRef", "NPP1"}, {"AccountNumber", "98765"},
+    vendor = host.Make<host::Vendor>({{"VendorId", 1},
+                                      {"Name", "Acme Apparel Pty Ltd"},
+                                      {"AddressLine1", "Unit 4"},
+                                      {"Suburb", "DANDENONG SOUTH"},
+                                      {"State", "VIC"},
+                                      {"Postcode", "3175"},
+                                      {"Country", "Australia"}});
+    carrier = host.Make<host::Carrier>({{"CarrierId", 2},
+                                        {"Options", "EP"},
+                                        {"NotifyOptions", "#%noemail"},
+                                        {"AccountRef", "NPP1"},
+                                        {"AccountNumber", "98765"},
                                         {"FileFolder", folder}});
     host.Make<host::Partner>({{"PartnerId", 1}});
     host.Make<host::EDIDocument>(
@@ -58,7 +65,8 @@ class eParcelFixture : public ::testing::Test {
     SetNow(DateTime::FromParts(local.tm_year + 1900, local.tm_mon + 1, local.tm_mday, 16, 30, 0));
   }
 
-  std::shared_ptr<MemoryObject<host::Order>> MakeOrder(const Fields& address, bool withSlipLine = true) {
+  std::shared_ptr<MemoryObject<host::Order>> MakeOrder(const Fields& address,
+                                                       bool withSlipLine = true) {
     std::vector<std::shared_ptr<host::PSlipLine>> lines;
     if (withSlipLine) lines.push_back(host.Make<host::PSlipLine>({{"Customer", customer}}));
     return host.Make<host::Order>({{"DeliveryAddress", host.Make<host::Address>(address)},
@@ -69,21 +77,29 @@ class eParcelFixture : public ::testing::Test {
   std::shared_ptr<MemoryObject<host::ConNote>> AddConNote(
       std::int32_t id, const std::string& number, int packs,
       const std::shared_ptr<MemoryObject<host::Order>>& order, const Fields& fields = {}) {
-    auto conNote = host.Make<host::ConNote>(
-        {{"ConNoteId", id}, {"ConNoteNo", number}, {"ConNoteDate", Now()}, {"Service", "EPARCEL"},
-         {"ServiceLevel", "STANDARD"}, {"Weight", 2.5}, {"PartnerCode", "HBS"},
-         {"DeliveryLocation", "RICHMOND"}, {"Vendor", vendor}, {"Carrier", carrier},
-         {"Orders", MemoryHost::List<host::Order>({order})}});
+    auto conNote = host.Make<host::ConNote>({{"ConNoteId", id},
+                                             {"ConNoteNo", number},
+                                             {"ConNoteDate", Now()},
+                                             {"Service", "EPARCEL"},
+                                             {"ServiceLevel", "STANDARD"},
+                                             {"Weight", 2.5},
+                                             {"PartnerCode", "HBS"},
+                                             {"DeliveryLocation", "RICHMOND"},
+                                             {"Vendor", vendor},
+                                             {"Carrier", carrier},
+                                             {"Orders", MemoryHost::List<host::Order>({order})}});
     for (const auto& [name, value] : fields) conNote->fields[name] = value;
     std::vector<std::shared_ptr<MemoryObject<host::Pack>>> list;
     for (int i = 0; i < packs; ++i)
-      list.push_back(host.Make<host::Pack>({{"Order", order}, {"Despatch", despatch}, {"Carton", carton}}));
+      list.push_back(
+          host.Make<host::Pack>({{"Order", order}, {"Despatch", despatch}, {"Carton", carton}}));
     MemoryHost::Attach(conNote, list);
     return conNote;
   }
 
   // Init, Load, Process of the given rows and Term; the results of Load and of each Process.
-  std::vector<std::int32_t> Run(std::string_view identifier, std::initializer_list<std::int32_t> rows) {
+  std::vector<std::int32_t> Run(std::string_view identifier,
+                                std::initializer_list<std::int32_t> rows) {
     auto object = CreateObject(identifier).object;
     auto* run = as<RowInterface>(object);
     Grid columns, grid;
@@ -102,7 +118,9 @@ class eParcelFixture : public ::testing::Test {
     std::sort(names.begin(), names.end());
     return names;
   }
-  std::string FileText(const std::string& name) const { return ReadFile(folder + name).value_or(""); }
+  std::string FileText(const std::string& name) const {
+    return ReadFile(folder + name).value_or("");
+  }
   // The texts of the nodes the path selects in the written file.
   std::vector<std::string> Values(const std::string& name, const char* path) const {
     pugi::xml_document doc;

@@ -28,7 +28,7 @@ class SymbolWriter {
     Put(value);
   }
   void Finish() {
-    Put(static_cast<int>(checksum_));
+    Put(static_cast<int>(checksum_ % 103));
     std::memcpy(at_, code128::kModules[code128::kStop].data(), code128::kStopModules);
     at_ += code128::kStopModules;
     out_.resize(static_cast<std::size_t>(at_ - out_.data()));

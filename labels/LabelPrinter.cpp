@@ -1,5 +1,6 @@
 #include "labels/LabelPrinter.h"
 
+#include <algorithm>
 #include <chrono>
 #include <functional>
 #include <thread>
@@ -232,7 +233,14 @@ void LabelPrinter::AbandonChannel() {
 }
 
 void LabelPrinter::WriteChannel(std::string_view text) {
-  if (handle_ != 0) CurrentSpooler().Write(handle_, ToCodePage(text));
+  if (handle_ == 0) return;
+  // Plain ASCII is the same in the code page: written as it is.
+  const bool ascii = std::all_of(text.begin(), text.end(),
+                                 [](char c) { return static_cast<unsigned char>(c) < 0x80; });
+  if (ascii)
+    CurrentSpooler().Write(handle_, text);
+  else
+    CurrentSpooler().Write(handle_, ToCodePage(text));
 }
 
 bool LabelPrinter::WriteLabel() {

@@ -1,5 +1,6 @@
 #include "labels/Vpcl.h"
 
+#include <array>
 #include <charconv>
 
 namespace quendal::vpcl {
@@ -80,19 +81,30 @@ struct Render {
 
 }  // namespace
 
+namespace {
+
+enum class Treat : unsigned char { Keep, Drop, Space };
+
+constexpr auto kTreat = [] {
+  std::array<Treat, 256> treat{};
+  for (int c = 0; c < 0x20; ++c) treat[static_cast<std::size_t>(c)] = Treat::Space;
+  treat[0x7F] = Treat::Space;
+  for (unsigned char c : {'"', '|', '{', '}'}) treat[c] = Treat::Drop;
+  return treat;
+}();
+
+}  // namespace
+
 void AppendFieldData(std::string& out, std::string_view text) {
-  for (char c : text) {
-    switch (c) {
-      case '"':
-      case '|':
-      case '{':
-      case '}':
-        break;
-      default:
-        const auto u = static_cast<unsigned char>(c);
-        out += (u < 0x20 || u == 0x7F) ? ' ' : c;
-    }
+  std::size_t run = 0;  // start of the characters kept as they are
+  for (std::size_t i = 0; i < text.size(); ++i) {
+    const Treat treat = kTreat[static_cast<unsigned char>(text[i])];
+    if (treat == Treat::Keep) continue;
+    out.append(text.data() + run, i - run);
+    if (treat == Treat::Space) out += ' ';
+    run = i + 1;
   }
+  out.append(text.data() + run, text.size() - run);
 }
 
 std::string FieldData(std::string_view text) {

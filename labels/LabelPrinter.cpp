@@ -194,6 +194,7 @@ bool LabelPrinter::OpenPtr() {
   if (!proc([&] { PumpMessages(); })) return result;
   // Hold the job back while the printer's queue is full.
   if (!proc([&] {
+        // Mode 2 never waits; nor does an unset mode, which compares as neither.
         const Var mode = system_->SpoolerMode();
         if (mode.IsNull() || mode.Number() == 2) return;
         while (SpooledJobCount(handle_) >= kQueueFull) {

@@ -19,12 +19,9 @@ TEST(VpclTest, EveryPacketKind) {
             "B,1,8,F,35,179,8,6,100,8,L,0|R,1,\"0123\"|G,99,532,241,0,0|}");
 }
 
-TEST(VpclTest, FieldDataStaysInsideItsQuotes) {
-  EXPECT_EQ(std::move(Batch("9", 2, "1").Field(1, "say \"hi\"|{x}").Field(2, "a\r\nb\t")).Finish(),
-            "{B,9,N,2|E,1,0,1,1,0,1|1,\"say hix\"|2,\"a  b \"|}");
-  // What stands around the fields is made safe the same way.
+TEST(VpclTest, HeaderTextsAreMadeSafeLikeFieldData) {
   EXPECT_EQ(std::move(Batch("4|3", 1, "1\"}")).Finish(), "{B,43,N,1|E,1,0,1,1,0,1|}");
-  EXPECT_EQ(FieldData("~201421036"), "~201421036");
+  EXPECT_EQ(FieldData("~201421036\x7F"), "~201421036 ");
 }
 
 }  // namespace

@@ -7,7 +7,6 @@
 #include <map>
 #include <regex>
 
-#include "frame/Catalogue.h"
 #include "frame/VB.h"
 #include "platform/Clock.h"
 #include "platform/Machine.h"
@@ -462,17 +461,6 @@ TEST_F(StarTrackGenericTest, QueueWait) {
   EXPECT_EQ(Printed(pack), kOrdinary);
 }
 
-TEST_F(StarTrackGenericTest, SpooledJobCount) {
-  Ready();
-  EXPECT_EQ(label.SpooledJobCount(0), 0);
-  long error = 0;
-  const auto handle = spooler->OpenPrinter("Dock 3", error);
-  EXPECT_EQ(label.SpooledJobCount(handle), 0);
-  spooler->queueLength = [](const std::string&) { return 5000; };
-  EXPECT_EQ(label.SpooledJobCount(handle), 999);
-  spooler->ClosePrinter(handle);
-}
-
 TEST_F(StarTrackGenericTest, UnknownLanguageIsLoggedAndNothingPrinted) {
   host.system->fields["PrinterLanguage"] = "ZPL";
   ASSERT_TRUE(label.Init(host.system, "Dock 3"));
@@ -498,15 +486,6 @@ TEST_F(StarTrackGenericTest, DrawnPrinterIsFoundByItsExactName) {
   EXPECT_TRUE(host.logs.empty());
   EXPECT_TRUE(label.Init(host.system, "office laser"));
   EXPECT_FALSE(label.PrintLabel(pack));
-}
-
-TEST_F(StarTrackGenericTest, CreatedByItsIdentifier) {
-  Created created = CreateObject(kDocument);
-  ASSERT_TRUE(created.object);
-  auto* printer = as<LabelInterface>(created.object);
-  ASSERT_TRUE(printer);
-  EXPECT_EQ(printer->PDTFieldLength(), "7,6,10,22,20,13,20,13,20,20,10,6,6,1,16,6");
-  EXPECT_EQ(printer->PrintVPCLII(), kGenericFormat);
 }
 
 }  // namespace

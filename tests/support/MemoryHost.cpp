@@ -122,7 +122,12 @@ MemoryHost::MemoryHost() : self_(std::shared_ptr<host::Library>(this, [](host::L
   previous_ = host::RegisterLibrary(self_);
 }
 
-MemoryHost::~MemoryHost() { host::RegisterLibrary(previous_); }
+MemoryHost::~MemoryHost() {
+  host::RegisterLibrary(previous_);
+  // Attach links consignments and packs both ways; unlink them so that they are freed.
+  for (const auto& conNote : conNotes) conNote->fields.clear();
+  for (const auto& pack : packs) pack->fields.clear();
+}
 
 std::vector<std::string> MemoryHost::LogMessages() const {
   std::vector<std::string> out;

@@ -5,6 +5,7 @@
 namespace quendal {
 
 // Factories of the built classes, defined beside each class.
+std::unique_ptr<Component> MakeStarTrackGenericSCM();
 std::unique_ptr<Component> MakeeParcelManifestxml();
 std::unique_ptr<Component> MakeeParcelManifestEODxml();
 
@@ -31,7 +32,7 @@ constexpr std::array kCatalogue = {
     CatalogueEntry{"clsMayneCMLSCM", Label, "Mayne", "CML", nullptr},
     CatalogueEntry{"clsMayneGenericSCM", Label, "Mayne", "any retailer", nullptr},
     CatalogueEntry{"clsStarTrackGenericSCM", Label, "StarTrack", "any retailer (reference class)",
-                   nullptr},
+                   MakeStarTrackGenericSCM},
     CatalogueEntry{"clsTollGenericSCM", Label, "Toll", "any retailer", nullptr},
     CatalogueEntry{"clsAaEGenericSCM", Label, "AaE", "any retailer", nullptr},
     CatalogueEntry{"clsAaEES610", Rows, "AaE", "ES610 file", nullptr},

@@ -5,6 +5,7 @@
 namespace quendal {
 
 // Factories of the built classes, defined beside each class.
+std::unique_ptr<Component> MakeStarTrackDAcln();
 
 namespace {
 
@@ -12,7 +13,7 @@ using enum Family;
 
 constexpr std::array kCatalogue = {
     CatalogueEntry{"clsStarTrackDAcln", Consignment, "StarTrack",
-                   "CLN consignment file, dangerous goods declaration", nullptr},
+                   "CLN consignment file, dangerous goods declaration", MakeStarTrackDAcln},
     CatalogueEntry{"clsTNTDAet11", Consignment, "TNT", "ET11 file", nullptr},
     CatalogueEntry{"clsStarTrackCMLSCM", Label, "StarTrack", "CML", nullptr},
     CatalogueEntry{"clsTNTCMLSCM", Label, "TNT", "CML", nullptr},

@@ -166,19 +166,19 @@ bool PrintDocumentOf(const std::string& printer, const Parties& parties, const G
       {"Number of outer packages of each type", goods.packages},
       {"Aggregate of each DG (Net Weight) kg", goods.netWeight},
   }};
-  // Each row stands in two white boxes, its label cell and its value cell.
-  constexpr double kGap = 100;
+  // Each row stands inside two white boxes, one round its label cell and
+  // one round its value cell, with a margin above and below the row.
+  constexpr double kMargin = 100;
   constexpr double kBoxHeight = 550;
-  constexpr double kLabelWidth = 5000;
-  constexpr double kValueWidth = 5000;
+  constexpr double kCellWidth = 5000;
   for (const TableRow& row : rows) {
     const double x = doc->CurrentX();
-    const double top = doc->CurrentY() + kGap;
-    doc->Rectangle(x, top, x + kLabelWidth, top + kBoxHeight, kWhite);
-    doc->Rectangle(x + kLabelWidth, top, x + kLabelWidth + kValueWidth, top + kBoxHeight, kWhite);
-    doc->SetCurrentY(top);
+    const double top = doc->CurrentY();
+    doc->Rectangle(x, top, x + kCellWidth, top + kBoxHeight, kWhite);
+    doc->Rectangle(x + kCellWidth, top, x + 2 * kCellWidth, top + kBoxHeight, kWhite);
+    doc->SetCurrentY(top + kMargin);
     doc->AddTable("<+5000|<+5000", row, {}, kShade);
-    doc->SetCurrentY(top + kBoxHeight);
+    doc->SetCurrentY(std::max(doc->CurrentY() + kMargin, top + kBoxHeight));
   }
 
   paragraph("");

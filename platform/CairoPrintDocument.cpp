@@ -129,7 +129,8 @@ struct CairoPrintDocument::Impl {
     pango_layout_set_width(layout, static_cast<int>(std::max(width, 1.0) * PANGO_SCALE));
     pango_layout_set_wrap(layout, PANGO_WRAP_WORD_CHAR);
     pango_layout_set_alignment(layout, align);
-    const std::string valid = ValidUtf8(text);
+    // An empty line is as high as a line of text in the same font.
+    const std::string valid = text.empty() ? std::string(" ") : ValidUtf8(text);
     pango_layout_set_text(layout, valid.c_str(), static_cast<int>(valid.size()));
     return layout;
   }

@@ -122,7 +122,12 @@ MemoryHost::MemoryHost() : self_(std::shared_ptr<host::Library>(this, [](host::L
   previous_ = host::RegisterLibrary(self_);
 }
 
-MemoryHost::~MemoryHost() { host::RegisterLibrary(previous_); }
+MemoryHost::~MemoryHost() {
+  // Attach links packs and their consignment both ways; break the links so both go.
+  for (const auto& pack : packs) pack->fields.clear();
+  for (const auto& conNote : conNotes) conNote->fields.clear();
+  host::RegisterLibrary(previous_);
+}
 
 std::vector<std::string> MemoryHost::LogMessages() const {
   std::vector<std::string> out;

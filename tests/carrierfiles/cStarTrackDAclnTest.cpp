@@ -233,13 +233,20 @@ TEST_F(StarTrackDAclnTest, AFutureConsignmentGoesToTheFolderOfItsDay) {
   EXPECT_TRUE(FileExists(folder + "2024-03-14/SRX00501.CLN"));
 }
 
-TEST_F(StarTrackDAclnTest, AFileCreatedOnAnotherDayIsNotReused) {
-  Process(ConNote(kNo, 1));
-  SetNow(DateTime::FromParts(2024, 3, 15, 9, 0, 0));
+TEST_F(StarTrackDAclnTest, TodaysFileIsFoundByItsCreationDate) {
+  // Creation dates come from the file system, so the clock runs on real time here.
+  SetNow(std::nullopt);
+  const DateTime today = Now();
+  Process(ConNote(kNo, 1, today));
   asn->fields["ASNNumber"] = 4500777;
-  // Today's file is chosen by its creation date, so tomorrow starts a new one.
-  Process(ConNote("SRXZ00012346", 1, DateTime::FromParts(2024, 3, 15, 8, 0, 0)));
-  EXPECT_THAT(File("SRX00777.CLN"), ::testing::StartsWith(Header("SRX00777.CLN", "20240315080000")));
+  Process(ConNote("SRXZ00012346", 1, today));
+  EXPECT_FALSE(FileExists(folder + "SRX00777.CLN"));
+  EXPECT_THAT(File("SRX00501.CLN"), HasSubstr(Item(kSscc[0], "S CTN", "SRXZ00012346")));
+
+  // The next day the file created today is no longer the day's file.
+  SetNow(today.AddDays(1));
+  Process(ConNote("SRXZ00012347", 1, today.AddDays(1)));
+  EXPECT_THAT(File("SRX00777.CLN"), ::testing::StartsWith("00NSRX00777.CLN"));
 }
 
 TEST_F(StarTrackDAclnTest, WeightAndCubicRules) {

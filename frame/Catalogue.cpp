@@ -8,6 +8,7 @@ namespace quendal {
 std::unique_ptr<Component> MakeStarTrackGenericSCM();
 std::unique_ptr<Component> MakeeParcelManifestxml();
 std::unique_ptr<Component> MakeeParcelManifestEODxml();
+std::unique_ptr<Component> MakeStarTrackDAcln();
 
 namespace {
 
@@ -15,7 +16,7 @@ using enum Family;
 
 constexpr std::array kCatalogue = {
     CatalogueEntry{"clsStarTrackDAcln", Consignment, "StarTrack",
-                   "CLN consignment file, dangerous goods declaration", nullptr},
+                   "CLN consignment file, dangerous goods declaration", MakeStarTrackDAcln},
     CatalogueEntry{"clsTNTDAet11", Consignment, "TNT", "ET11 file", nullptr},
     CatalogueEntry{"clsStarTrackCMLSCM", Label, "StarTrack", "CML", nullptr},
     CatalogueEntry{"clsTNTCMLSCM", Label, "TNT", "CML", nullptr},

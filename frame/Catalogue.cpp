@@ -5,6 +5,10 @@
 namespace quendal {
 
 // Factories of the built classes, defined beside each class.
+std::unique_ptr<Component> MakeStarTrackGenericSCM();
+std::unique_ptr<Component> MakeeParcelManifestxml();
+std::unique_ptr<Component> MakeeParcelManifestEODxml();
+std::unique_ptr<Component> MakeStarTrackDAcln();
 
 namespace {
 
@@ -12,7 +16,7 @@ using enum Family;
 
 constexpr std::array kCatalogue = {
     CatalogueEntry{"clsStarTrackDAcln", Consignment, "StarTrack",
-                   "CLN consignment file, dangerous goods declaration", nullptr},
+                   "CLN consignment file, dangerous goods declaration", MakeStarTrackDAcln},
     CatalogueEntry{"clsTNTDAet11", Consignment, "TNT", "ET11 file", nullptr},
     CatalogueEntry{"clsStarTrackCMLSCM", Label, "StarTrack", "CML", nullptr},
     CatalogueEntry{"clsTNTCMLSCM", Label, "TNT", "CML", nullptr},
@@ -29,7 +33,7 @@ constexpr std::array kCatalogue = {
     CatalogueEntry{"clsMayneCMLSCM", Label, "Mayne", "CML", nullptr},
     CatalogueEntry{"clsMayneGenericSCM", Label, "Mayne", "any retailer", nullptr},
     CatalogueEntry{"clsStarTrackGenericSCM", Label, "StarTrack", "any retailer (reference class)",
-                   nullptr},
+                   MakeStarTrackGenericSCM},
     CatalogueEntry{"clsTollGenericSCM", Label, "Toll", "any retailer", nullptr},
     CatalogueEntry{"clsAaEGenericSCM", Label, "AaE", "any retailer", nullptr},
     CatalogueEntry{"clsAaEES610", Rows, "AaE", "ES610 file", nullptr},
@@ -49,7 +53,8 @@ constexpr std::array kCatalogue = {
     CatalogueEntry{"clsIFSAPISCM", Label, "IFS", "any retailer", nullptr},
     CatalogueEntry{"clsIFSDJsSCM", Label, "IFS", "David Jones", nullptr},
     CatalogueEntry{"clsAustPostSCM", Label, "Australia Post", "article-id labels", nullptr},
-    CatalogueEntry{"clseParcelManifestxml", Rows, "Australia Post eParcel", "PCMS manifest", nullptr},
+    CatalogueEntry{"clseParcelManifestxml", Rows, "Australia Post eParcel", "PCMS manifest",
+                   MakeeParcelManifestxml},
     CatalogueEntry{"clsSCMnoSSCC", Label, "any", "label without SSCC", nullptr},
     CatalogueEntry{"clsStarTrackSpotlightSCM", Label, "StarTrack", "Spotlight", nullptr},
     CatalogueEntry{"clsStarTrackBigWERSCM", Label, "StarTrack", "BigW", nullptr},
@@ -69,7 +74,7 @@ constexpr std::array kCatalogue = {
     CatalogueEntry{"clsAustPostDespatchSCM", Label, "Australia Post", "despatch article-id labels",
                    nullptr},
     CatalogueEntry{"clseParcelManifestEODxml", Rows, "Australia Post eParcel", "PCMS end of day",
-                   nullptr},
+                   MakeeParcelManifestEODxml},
     CatalogueEntry{"clsTollDJsSCM", Label, "Toll", "David Jones", nullptr},
 };
 static_assert(kCatalogue.size() == 48);

@@ -48,7 +48,8 @@ constexpr std::array<std::string_view, 7> kWeekdays = {
     "Sunday", "Monday", "Tuesday", "Wednesday", "Thursday", "Friday", "Saturday"};
 
 std::string TwoDigits(int v) {
-  char buf[8];
+  if (v >= 0 && v < 100) return {static_cast<char>('0' + v / 10), static_cast<char>('0' + v % 10)};
+  char buf[16];
   std::snprintf(buf, sizeof buf, "%02d", v);
   return buf;
 }

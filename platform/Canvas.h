@@ -8,11 +8,10 @@
 #include <string>
 #include <string_view>
 
+#include "platform/Colour.h"
+
 namespace quendal {
 
-using Colour = std::uint32_t;  // 0xRRGGBB
-inline constexpr Colour kBlack = 0x000000;
-inline constexpr Colour kWhite = 0xFFFFFF;
 
 struct CanvasFont {
   int height = 0;  // cell height in pixels

@@ -129,8 +129,15 @@ bool DirectorySpooler::EndDoc(std::int32_t handle) {
   auto it = open_.find(handle);
   if (it == open_.end() || it->second.document.empty()) return false;
   Open& doc = it->second;
+  // A document named "*.pdf" is a PDF job and keeps that extension.
+  std::string name = doc.document;
+  std::string extension = "prn";
+  if (name.size() > 4 && LCase(Right(name, 4)) == ".pdf") {
+    name.resize(name.size() - 4);
+    extension = "pdf";
+  }
   // The job appears whole: written beside the queue, then renamed into it.
-  const bool ok = ReplaceFile(NextJobPath(doc.printer, doc.document, "prn"), doc.bytes);
+  const bool ok = ReplaceFile(NextJobPath(doc.printer, name, extension), doc.bytes);
   doc.document.clear();
   doc.bytes.clear();
   return ok;

@@ -1,6 +1,7 @@
 // The embedded default spooler: printer NAME is the folder SPOOL/NAME/ (it
 // exists = it is installed); each job is one file
-// SPOOL/NAME/NNNNNN-<document name>.prn holding the bytes as sent; the
+// SPOOL/NAME/NNNNNN-<document name>.prn holding the bytes as sent (a
+// document named "*.pdf" is a PDF job: NNNNNN-<name>.pdf); the
 // queue length is the number of job files. SPOOL/NAME/printer.ini may set
 // dpi= (default 300).
 #pragma once

@@ -126,4 +126,48 @@ std::optional<std::uintmax_t> FileSize(const std::string& path) {
   return size;
 }
 
+namespace {
+
+FileStamp StampFrom(const struct stat& st) {
+  return FileStamp{static_cast<std::uintmax_t>(st.st_dev), static_cast<std::uintmax_t>(st.st_ino),
+                   static_cast<std::uintmax_t>(st.st_size),
+                   static_cast<std::int64_t>(st.st_mtim.tv_sec) * 1000000000 + st.st_mtim.tv_nsec};
+}
+
+}  // namespace
+
+std::optional<FileStamp> StampOf(const std::string& path) {
+  struct stat st {};
+  if (::stat(path.c_str(), &st) != 0 || !S_ISREG(st.st_mode)) return std::nullopt;
+  return StampFrom(st);
+}
+
+bool AppendingFile::Open(const std::string& path) {
+  Close();
+  fd_ = ::open(path.c_str(), O_WRONLY | O_APPEND | O_CREAT | O_CLOEXEC, 0644);
+  return fd_ >= 0;
+}
+
+std::optional<FileStamp> AppendingFile::Stamp() const {
+  struct stat st {};
+  if (fd_ < 0 || ::fstat(fd_, &st) != 0) return std::nullopt;
+  return StampFrom(st);
+}
+
+bool AppendingFile::Append(std::string_view bytes) {
+  if (fd_ < 0) return false;
+  struct stat st {};
+  if (::fstat(fd_, &st) != 0) return false;
+  if (WriteAll(fd_, bytes)) return true;
+  // Take back what the failed write left behind.
+  const int cut = ::ftruncate(fd_, st.st_size);
+  static_cast<void>(cut);
+  return false;
+}
+
+void AppendingFile::Close() {
+  if (fd_ >= 0) ::close(fd_);
+  fd_ = -1;
+}
+
 }  // namespace quendal

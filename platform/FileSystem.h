@@ -2,6 +2,7 @@
 // creation dates, create folders, append, replace a file atomically.
 #pragma once
 
+#include <cstdint>
 #include <optional>
 #include <string>
 #include <string_view>
@@ -32,5 +33,39 @@ bool AppendFile(const std::string& path, std::string_view bytes);
 bool ReplaceFile(const std::string& path, std::string_view bytes);
 bool DeleteFile(const std::string& path);
 std::optional<std::uintmax_t> FileSize(const std::string& path);
+
+// What tells one state of a file from another: its identity, size and
+// modification time. A cache of a file's contents stays valid while the
+// stamp is unchanged.
+struct FileStamp {
+  std::uintmax_t device = 0;
+  std::uintmax_t inode = 0;
+  std::uintmax_t size = 0;
+  std::int64_t modifiedNs = 0;
+  bool operator==(const FileStamp&) const = default;
+};
+std::optional<FileStamp> StampOf(const std::string& path);
+
+// A file opened for appending (created when missing) and closed again when
+// the object goes or Close is called.
+class AppendingFile {
+ public:
+  AppendingFile() = default;
+  ~AppendingFile() { Close(); }
+  AppendingFile(const AppendingFile&) = delete;
+  AppendingFile& operator=(const AppendingFile&) = delete;
+
+  bool Open(const std::string& path);
+  bool IsOpen() const { return fd_ >= 0; }
+  std::optional<FileStamp> Stamp() const;
+  // Writes all bytes at the end of the file. When the write fails part-way
+  // the file is cut back to its length before the call, so a reader never
+  // finds half of what was meant to go in together.
+  bool Append(std::string_view bytes);
+  void Close();
+
+ private:
+  int fd_ = -1;
+};
 
 }  // namespace quendal

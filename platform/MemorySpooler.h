@@ -45,6 +45,8 @@ class MemorySpooler : public Spooler {
   // When set, answers the queue length instead of counting jobs; called once per question.
   std::function<std::int32_t(const std::string& printer)> queueLength;
   int opens = 0;
+  // Printers opened and not closed yet.
+  std::size_t OpenHandles() const { return open_.size(); }
 
  private:
   std::map<std::string, int> printers_;

@@ -1,7 +1,11 @@
 #include "platform/Settings.h"
 
+#include <sys/stat.h>
+
 #include <cstdlib>
 #include <filesystem>
+#include <map>
+#include <mutex>
 #include <sstream>
 #include <vector>
 
@@ -48,22 +52,75 @@ std::string ValueOf(const std::string& line) {
 }  // namespace
 
 std::string SettingsPath(std::string_view application) {
-  std::filesystem::path base;
+  // Built as text: it is asked for every label.
+  std::string path;
   if (const char* xdg = std::getenv("XDG_CONFIG_HOME"); xdg && *xdg) {
-    base = xdg;
+    path = xdg;
   } else if (const char* home = std::getenv("HOME"); home && *home) {
-    base = std::filesystem::path(home) / ".config";
+    path = home;
+    if (path.back() != '/') path += '/';
+    path += ".config";
   } else {
-    base = ".config";
+    path = ".config";
   }
-  return (base / std::string(application) / "settings.ini").string();
+  if (path.back() != '/') path += '/';
+  path += application;
+  path += "/settings.ini";
+  return path;
 }
+
+namespace {
+
+// Which version of a settings file was read: any save (ours replaces the
+// file, giving it a new inode) or edit in place changes one of these.
+struct FileStamp {
+  dev_t device = 0;
+  ino_t inode = 0;
+  off_t size = 0;
+  std::int64_t modified = 0;  // nanoseconds
+  std::int64_t changed = 0;
+
+  bool operator==(const FileStamp&) const = default;
+};
+
+std::optional<FileStamp> Stamp(const std::string& path) {
+  struct stat st {};
+  if (::stat(path.c_str(), &st) != 0) return std::nullopt;
+  return FileStamp{st.st_dev, st.st_ino, st.st_size,
+                   st.st_mtim.tv_sec * 1000000000LL + st.st_mtim.tv_nsec,
+                   st.st_ctim.tv_sec * 1000000000LL + st.st_ctim.tv_nsec};
+}
+
+// Label classes read their switch for every label: the parsed file is kept
+// and read again only when the file changed.
+std::string CachedValue(const std::string& path, std::string_view section, std::string_view key,
+                        std::string_view fallback) {
+  struct Parsed {
+    FileStamp stamp;
+    std::vector<IniLine> lines;
+  };
+  static std::mutex mutex;
+  static std::map<std::string, Parsed, std::less<>> cache;
+  const auto stamp = Stamp(path);
+  if (!stamp) return std::string(fallback);
+  std::lock_guard lock(mutex);
+  auto it = cache.find(path);
+  if (it == cache.end() || !(it->second.stamp == *stamp)) {
+    // Stamp again after reading: a file replaced meanwhile is read next time.
+    Parsed parsed{*stamp, ReadIni(path)};
+    if (Stamp(path) != stamp) parsed.stamp = FileStamp{};
+    it = cache.insert_or_assign(path, std::move(parsed)).first;
+  }
+  for (const IniLine& line : it->second.lines)
+    if (line.section == section && line.key == key) return ValueOf(line.text);
+  return std::string(fallback);
+}
+
+}  // namespace
 
 std::string GetSetting(std::string_view application, std::string_view section,
                        std::string_view key, std::string_view fallback) {
-  for (const IniLine& line : ReadIni(SettingsPath(application)))
-    if (line.section == section && line.key == key) return ValueOf(line.text);
-  return std::string(fallback);
+  return CachedValue(SettingsPath(application), section, key, fallback);
 }
 
 bool SaveSetting(std::string_view application, std::string_view section, std::string_view key,

@@ -55,5 +55,16 @@ TEST_F(SettingsTest, KeepsOtherSectionsAndComments) {
             "; host settings\n[Window]\nLeft = 10\n[Settings]\nA=1\nB=2\n");
 }
 
+TEST_F(SettingsTest, AChangeByAnotherWriterIsReadAtOnce) {
+  ASSERT_TRUE(SaveSetting("Merivane", "Settings", "clsStarTrackGenericSCM", "True"));
+  const std::string path = SettingsPath("Merivane");
+  EXPECT_EQ(GetSetting("Merivane", "Settings", "clsStarTrackGenericSCM", "x"), "True");
+  // Same size, replaced by rename, as an editor or the host would.
+  ASSERT_TRUE(ReplaceFile(path, "[Settings]\nclsStarTrackGenericSCM=Fals\n"));
+  EXPECT_EQ(GetSetting("Merivane", "Settings", "clsStarTrackGenericSCM", "x"), "Fals");
+  fs::remove(path);
+  EXPECT_EQ(GetSetting("Merivane", "Settings", "clsStarTrackGenericSCM", "x"), "x");
+}
+
 }  // namespace
 }  // namespace quendal

@@ -114,15 +114,52 @@ void AddMethods(MemoryHost& host, MemoryObject<host::Manifest>& m) {
   };
 }
 
+// True when the consignment's vendor and carrier carry the given ids (compared as text).
+static bool SameVendorAndCarrier(MemoryObject<host::ConNote>& c, const Var& vendorId,
+                          const Var& carrierId) {
+  auto vendor = host::Object::As<host::Vendor>(c.Get("Vendor"));
+  auto carrier = host::Object::As<host::Carrier>(c.Get("Carrier"));
+  const std::string v = vendor ? vendor->VendorId().Text() : std::string();
+  const std::string k = carrier ? carrier->CarrierId().Text() : std::string();
+  return v == vendorId.Text() && k == carrierId.Text();
+}
+
 MemoryHost::MemoryHost() : self_(std::shared_ptr<host::Library>(this, [](host::Library*) {})) {
   system = Make<host::System>({{"PrinterLanguage", "VPCLII"},
                                {"PrinterBatchMode", 1},
                                {"SpoolerMode", 2},
                                {"UserName", "packer1"}});
+  // The consignments made so far, in order: those awaiting a manifest
+  // (ManifestId Null or 0), and those of a date range (end excluded).
+  system->methods["GetManifestConNotes"] = [this](std::span<const Var> args) {
+    auto list = std::make_shared<MemoryCollection<host::ConNotes>>();
+    for (const auto& c : conNotes)
+      if (c->Get("ManifestId").NumberOr(0) == 0 && args.size() == 2 &&
+          SameVendorAndCarrier(*c, args[0], args[1]))
+        list->items.push_back(c);
+    return Var(list);
+  };
+  system->methods["GetConNotesByDate"] = [this](std::span<const Var> args) {
+    auto list = std::make_shared<MemoryCollection<host::ConNotes>>();
+    if (args.size() != 4) return Var(list);
+    const DateTime begin = args[0].Date();
+    const DateTime end = args[1].Date();
+    for (const auto& c : conNotes) {
+      const Var date = c->Get("ConNoteDate");
+      if (date.IsNull() || !SameVendorAndCarrier(*c, args[2], args[3])) continue;
+      if (begin <= date.Date() && date.Date() < end) list->items.push_back(c);
+    }
+    return Var(list);
+  };
   previous_ = host::RegisterLibrary(self_);
 }
 
-MemoryHost::~MemoryHost() { host::RegisterLibrary(previous_); }
+MemoryHost::~MemoryHost() {
+  // Attach links consignments and packs both ways; undo that so neither outlives the host.
+  for (const auto& conNote : conNotes) conNote->fields.clear();
+  for (const auto& pack : packs) pack->fields.clear();
+  host::RegisterLibrary(previous_);
+}
 
 std::vector<std::string> MemoryHost::LogMessages() const {
   std::vector<std::string> out;

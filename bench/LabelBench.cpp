@@ -1,0 +1,154 @@
+// Carton labels per second through PrintLabel (in-memory host objects) to
+// the in-memory and the directory spooler, and Code 128 encoding of the
+// SSCC element string.
+#include <benchmark/benchmark.h>
+
+#include <cstdlib>
+#include <filesystem>
+#include <unistd.h>
+
+#include "labels/WinPrint.h"
+#include "labels/cStarTrackGenericSCM.h"
+#include "platform/Clock.h"
+#include "platform/DirectorySpooler.h"
+#include "platform/MemorySpooler.h"
+#include "platform/Settings.h"
+#include "tests/support/MemoryHost.h"
+
+#ifdef QUENDAL_BENCH_ZINT
+#include <zint.h>
+#endif
+
+namespace quendal {
+namespace {
+
+namespace fs = std::filesystem;
+
+// One packing station: the host objects of a carton, its settings file,
+// the clock fixed.
+struct Station {
+  Station() {
+    root = fs::temp_directory_path() / ("quendal-bench-" + std::to_string(::getpid()));
+    fs::remove_all(root);
+    fs::create_directories(root / "spool" / "Dock 3");
+    ::setenv("XDG_CONFIG_HOME", (root / "config").c_str(), 1);
+    SaveSetting("Merivane", "Settings", "clsStarTrackGenericSCM", "True");
+    SaveSetting("Merivane", "Settings", "clsTollGenericSCM", "False");
+    SetNow(DateTime::FromParts(2024, 3, 1, 9, 30));
+    host.system->fields["SpoolerMode"] = 0;
+    host.Make<host::Receiver>({{"Code", "0412"},
+                               {"PartnerId", 3},
+                               {"Name", "Rebel Sport Chadstone"},
+                               {"AddressLine1", "Shop 1040 Chadstone Centre"},
+                               {"AddressLine2", "1341 Dandenong Road"},
+                               {"Suburb", "Chadstone"},
+                               {"State", "VIC"},
+                               {"Postcode", "3148"}});
+    auto conNote = host.Make<host::ConNote>(
+        {{"ConNoteNo", "STK000123456789"}, {"Service", "ROAD EXPRESS"}, {"ServiceLevel", "EXP"}});
+    pack = host.Make<host::Pack>(
+        {{"PackId", 1},
+         {"SSCC", "00093123450000000012"},
+         {"StoreCode", "DC"},
+         {"PartnerId", 3},
+         {"SalesOrderNo", "778123"},
+         {"ASNId", 55},
+         {"CarrierId", 7},
+         {"Carrier", host.Make<host::Carrier>({{"Name", "StarTrack Express"}, {"Options", "#%ATL"}})},
+         {"Vendor", host.Make<host::Vendor>({{"Name", "Merivane Outdoor Supplies"},
+                                            {"AddressLine2", "12 Foundry Road"},
+                                            {"AddressLine3", "Dandenong South"},
+                                            {"State", "VIC"}})},
+         {"Receiver", host.Make<host::Receiver>({{"StoreCode", "0412"}})},
+         {"ShipTo", host.Make<host::Receiver>({{"CountryCode", "036"}})},
+         {"Order", host.Make<host::Order>({{"DeliveryAddress", host.Make<host::Address>()}})},
+         {"Despatch", host.Make<host::Despatch>({{"DespatchNo", "4500012345"},
+                                                {"NotBefore", DateTime::FromParts(2024, 3, 4)},
+                                                {"NotAfter", DateTime::FromParts(2024, 3, 8)}})},
+         {"Carton", host.Make<host::Carton>({{"Code", "CTN"}})}});
+    test::MemoryHost::Attach(conNote, {pack});
+  }
+  ~Station() {
+    SetNow(std::nullopt);
+    fs::remove_all(root);
+  }
+  fs::path root;
+  test::MemoryHost host;
+  std::shared_ptr<test::MemoryObject<host::Pack>> pack;
+};
+
+void BM_PrintLabelToMemorySpooler(benchmark::State& state) {
+  Station station;
+  auto spooler = std::make_shared<MemorySpooler>();
+  spooler->AddPrinter("Dock 3");
+  spooler->queueLength = [](const std::string&) { return 3; };
+  auto previous = SetSpooler(spooler);
+  clsStarTrackGenericSCM label;
+  label.Init(station.host.system, "Dock 3");
+  Ref<host::Pack> pack = station.pack;
+  std::int64_t bytes = 0;
+  for (auto _ : state) {
+    if (!label.PrintLabel(pack)) state.SkipWithError("PrintLabel failed");
+    bytes += static_cast<std::int64_t>(spooler->jobs.back().bytes.size());
+    if (spooler->jobs.size() >= 1024) spooler->jobs.clear();
+  }
+  state.SetItemsProcessed(state.iterations());
+  state.SetBytesProcessed(bytes);
+  SetSpooler(previous);
+}
+BENCHMARK(BM_PrintLabelToMemorySpooler);
+
+void BM_PrintLabelToDirectorySpooler(benchmark::State& state) {
+  Station station;
+  const fs::path folder = station.root / "spool" / "Dock 3";
+  auto previous = SetSpooler(std::make_shared<DirectorySpooler>((station.root / "spool").string()));
+  clsStarTrackGenericSCM label;
+  label.Init(station.host.system, "Dock 3");
+  Ref<host::Pack> pack = station.pack;
+  std::int64_t printed = 0;
+  for (auto _ : state) {
+    if (!label.PrintLabel(pack)) state.SkipWithError("PrintLabel failed");
+    // The printer takes its jobs away now and then.
+    if (++printed % 200 == 0) {
+      state.PauseTiming();
+      for (const auto& entry : fs::directory_iterator(folder))
+        if (entry.path().extension() == ".prn") fs::remove(entry.path());
+      state.ResumeTiming();
+    }
+  }
+  state.SetItemsProcessed(state.iterations());
+  SetSpooler(previous);
+}
+BENCHMARK(BM_PrintLabelToDirectorySpooler);
+
+void BM_BarPatternSscc(benchmark::State& state) {
+  const std::string data = "~20100093123450000000012";
+  for (auto _ : state) benchmark::DoNotOptimize(BarPattern(data));
+  state.SetItemsProcessed(state.iterations());
+}
+BENCHMARK(BM_BarPatternSscc);
+
+#ifdef QUENDAL_BENCH_ZINT
+// For comparison: Zint encoding the same element string as GS1-128.
+void BM_ZintGs1128Sscc(benchmark::State& state) {
+  zint_symbol* symbol = ZBarcode_Create();
+  const std::string data = "[00]093123450000000012";
+  for (auto _ : state) {
+    ZBarcode_Clear(symbol);
+    symbol->symbology = BARCODE_GS1_128;
+    symbol->input_mode = GS1_MODE;
+    if (ZBarcode_Encode(symbol, reinterpret_cast<const unsigned char*>(data.data()),
+                        static_cast<int>(data.size())) >= ZINT_ERROR)
+      state.SkipWithError(symbol->errtxt);
+    benchmark::DoNotOptimize(symbol->encoded_data);
+  }
+  ZBarcode_Delete(symbol);
+  state.SetItemsProcessed(state.iterations());
+}
+BENCHMARK(BM_ZintGs1128Sscc);
+#endif
+
+}  // namespace
+}  // namespace quendal
+
+BENCHMARK_MAIN();

@@ -1,0 +1,71 @@
+// Fixed-width carrier records declared as a list of fields and rendered to
+// one line. A layout is a constexpr array of fields; the values of the
+// fields that take one are handed over in layout order.
+//
+//   constexpr std::array kItem = {Literal("20"), TextLeft(20), TextLeft(0)};
+//   std::string line = Render(kItem, {conNoteNo, sscc});
+//
+// Fill rules never cut: a value longer than its field is written whole and
+// shifts the rest of the line. Only CutLeft takes the first characters.
+#pragma once
+
+#include <cstdint>
+#include <initializer_list>
+#include <span>
+#include <string>
+#include <string_view>
+
+#include "frame/Var.h"
+
+namespace quendal::record {
+
+enum class Kind : std::uint8_t {
+  Literal,    // the field's own text
+  Spaces,     // `width` spaces
+  TextLeft,   // the value, padded with spaces on the right to `width`
+  TextRight,  // the value, padded with spaces on the left to `width`
+  CutLeft,    // the first `width` characters of the value, padded on the right
+  Zero,       // the value as a whole number, zero-filled on the left to `width` digits
+  Date,       // the value formatted with the mask; a missing date is empty
+};
+
+struct Field {
+  Kind kind;
+  int width;              // characters the field takes when the value fits
+  std::string_view text;  // the literal, or the date mask
+};
+
+constexpr Field Literal(std::string_view text) {
+  return {Kind::Literal, static_cast<int>(text.size()), text};
+}
+constexpr Field Spaces(int width) { return {Kind::Spaces, width, {}}; }
+constexpr Field TextLeft(int width) { return {Kind::TextLeft, width, {}}; }
+constexpr Field TextRight(int width) { return {Kind::TextRight, width, {}}; }
+constexpr Field CutLeft(int width) { return {Kind::CutLeft, width, {}}; }
+constexpr Field Zero(int width) { return {Kind::Zero, width, {}}; }
+// Masks whose output is as long as the mask ("YYYYMMDDHHMMSS", "DD-MMM-YYYY  ").
+constexpr Field Date(std::string_view mask) {
+  return {Kind::Date, static_cast<int>(mask.size()), mask};
+}
+
+constexpr bool TakesValue(const Field& field) {
+  return field.kind != Kind::Literal && field.kind != Kind::Spaces;
+}
+
+// The length of a line whose values all fit their fields.
+constexpr int Width(std::span<const Field> layout) {
+  int width = 0;
+  for (const Field& field : layout) width += field.width;
+  return width;
+}
+
+// The line (UTF-8, without line ending). Null reads as the empty text;
+// values missing at the end of the list read as Null. Control characters
+// in values (line breaks, tabs) become spaces: a value must never split or
+// skew a record.
+std::string Render(std::span<const Field> layout, std::initializer_list<Var> values);
+
+// One field on its own, for values that are put together before they go in.
+std::string Fill(const Field& field, const Var& value);
+
+}  // namespace quendal::record

@@ -1,0 +1,182 @@
+// The frame every label class is built on: the label interface's
+// properties, the print flow (Init downloads the class's VPCL II format;
+// PrintLabel reads the switch, opens the printer channel, fills the label
+// values and writes the batch), the printer channel over the spooler, and
+// the label values record the writers read.
+//
+// A label class supplies its constants (class name, format number), its
+// format as a list of packets, its batch fields as a table over
+// LabelValues, and, where it reads the host differently, its own
+// FillValues.
+#pragma once
+
+#include <cstdint>
+#include <optional>
+#include <span>
+#include <string>
+#include <string_view>
+
+#include "frame/ComponentBase.h"
+#include "labels/Vpcl.h"
+
+namespace quendal {
+
+// The values of one carton label, read from the host for one pack. Texts
+// are cut to the widths the layouts leave them; a Null host value reads as
+// the empty text.
+struct LabelValues {
+  bool AuthorityToLeave = false;
+  std::string FromName;
+  std::string FromLine2;
+  std::string FromLine3;
+  std::string FromState;
+  std::string LabelCarrierId;
+  std::string CarrierName;
+  std::string ConNoteNo;
+  std::string ServiceLine;
+  std::string PostcodeServiceLine;
+  std::string ToNameShort;
+  std::string ToName;
+  std::string ToAddress1;
+  std::string ToAddress2;
+  std::string ToSuburb;
+  std::string ToState;
+  std::string ToPostcode;
+  std::string ToSuburbUpper;
+  std::string CountryCode;
+  std::string SSCC;
+  std::string OrderLine;
+  std::string SalesOrderLine;
+  std::string NotBeforeLine;
+  std::string NotAfterLine;
+  std::string PackedLine;
+  // Position of the pack in its consignment and its authority-to-leave
+  // number; only authority-to-leave labels renew them.
+  std::int16_t PackOrdinal = 0;
+  std::string ATLNumber;
+  std::string UserText1;
+  std::string UserText2;
+  std::string StoreZoneDept;
+  // The large store reference some layouts print top right; empty unless a
+  // class fills it.
+  std::string StoreText;
+};
+
+// One field of a batch: its number, its data, and when it is sent (always
+// when `sent` is null).
+struct BatchField {
+  int number;
+  std::string (*data)(const LabelValues&);
+  bool (*sent)(const LabelValues&) = nullptr;
+};
+
+// What makes one label class's output its own.
+struct LabelLayout {
+  std::string_view formatNumber;  // "430"
+  vpcl::Format format;
+  std::span<const BatchField> batch;
+};
+
+class LabelPrinter : public virtual LabelInterface, public ComponentBase {
+ public:
+  bool PrintSCMatOpen() const override { return printSCMatOpen_; }
+  void SetPrintSCMatOpen(bool value) override { printSCMatOpen_ = value; }
+  bool OLESubPackComponent() const override { return oleSubPackComponent_; }
+  void SetOLESubPackComponent(bool value) override { oleSubPackComponent_ = value; }
+  bool PrintSCMatClose() const override { return printSCMatClose_; }
+  void SetPrintSCMatClose(bool value) override { printSCMatClose_ = value; }
+  bool Prepack() const override { return prepack_; }
+  void SetPrepack(bool value) override { prepack_ = value; }
+  bool PrePackComplete() const override { return prePackComplete_; }
+  void SetPrePackComplete(bool value) override { prePackComplete_ = value; }
+  std::string PrePackStyle() const override { return prePackStyle_; }
+  void SetPrePackStyle(const std::string& value) override { prePackStyle_ = value; }
+  bool ValidateClose() const override { return validateClose_; }
+  void SetValidateClose(bool value) override { validateClose_ = value; }
+  void SetUser1(const std::string& value) override;
+  void SetUser2(const std::string& value) override;
+  void SetComponentPrint(bool value) override { componentPrint_ = value; }
+  void SetComponentItem(std::int16_t value) override { componentItem_ = value; }
+  void SetComponentCount(std::int16_t value) override { componentCount_ = value; }
+  void SetComponentStyle(const std::string& value) override { componentStyle_ = value; }
+  void SetStoreZoneDept(const std::string& value) override;
+  std::string PDTFieldLength() const override;
+
+  bool Init(const Ref<host::System>& system, const std::string& aPrinter = {}) override;
+  bool PrintLabel(const Ref<host::Pack>& aPack, std::optional<std::int16_t> Qty = {},
+                  std::optional<bool> ComDirect = {}) override;
+  std::string VPCLIIBatchCommand() override;
+  std::string PrintVPCLII() override;
+  std::int32_t SpooledJobCount(std::int32_t aPrinterHandle) override;
+
+  // The values of the last label, and its copy count.
+  const LabelValues& Values() const { return values_; }
+  std::int16_t CopyCount() const { return copies_; }
+  // The drawn channel's printer resolution, twips per pixel (0 until a
+  // drawn printer was opened).
+  float TwipsPerPixelX() const { return twipsPerPixelX_; }
+  float TwipsPerPixelY() const { return twipsPerPixelY_; }
+
+ protected:
+  // layout must outlive the object (a class's constexpr table).
+  LabelPrinter(std::string_view className, const LabelLayout& layout);
+
+  // Reads the host objects of the current pack into values_ and sets the
+  // copy count, each read a step of the calling procedure (PrintLabel), so
+  // that a failing read is reported against it and Retry or Ignore act on
+  // that one read. False when the operator left at a failure (Abort).
+  virtual bool FillValues(Procedure& proc);
+  // Whether Init downloads the format for this printer language.
+  virtual bool DownloadsFormat(const std::string& language) const;
+  // Writes the label in a language other than "WinPCL" and "VPCLII" to the
+  // open channel; false when the class does not speak it.
+  virtual bool WriteOtherLanguage(const std::string& language);
+
+  // The printer channel: one job per call, opened and closed inside it.
+  bool OpenPtr();
+  void ClosePtr();
+  // The text as single-byte code page bytes, in one write to the open job.
+  void WriteChannel(std::string_view text);
+  bool WriteLabel();
+
+  // The delivery address fields (ToNameShort to ToPostcode), as steps of
+  // the caller's procedure: the addressed store is looked up for every
+  // label, and the pack's order's delivery address replaces it when it
+  // names someone.
+  bool ReadDeliveryAddress(Procedure& proc);
+
+  Ref<host::Pack> pack_;
+  LabelValues values_;
+  std::int16_t copies_ = 0;
+  std::string printerName_;
+  std::string formatNumber_;
+  std::string user1_;
+  std::string user2_;
+  std::string storeZoneDept_;
+  bool componentPrint_ = false;
+  std::int16_t componentItem_ = 0;
+  std::int16_t componentCount_ = 0;
+  std::string componentStyle_;
+
+ private:
+  // Drops a job left open by a procedure that ended early, so that no
+  // half-written label is queued and no printer stays open.
+  void AbandonChannel();
+  bool IsDrawn() const;
+
+  const LabelLayout& layout_;
+  bool printSCMatOpen_ = false;
+  bool oleSubPackComponent_ = false;
+  bool printSCMatClose_ = false;
+  bool prepack_ = false;
+  bool prePackComplete_ = false;
+  std::string prePackStyle_;
+  bool validateClose_ = false;
+
+  std::int32_t handle_ = 0;
+  std::int32_t job_ = 0;
+  float twipsPerPixelX_ = 0;
+  float twipsPerPixelY_ = 0;
+};
+
+}  // namespace quendal

@@ -1,0 +1,147 @@
+#include "labels/Vpcl.h"
+
+#include <array>
+#include <charconv>
+
+namespace quendal::vpcl {
+
+namespace {
+
+class Writer {
+ public:
+  explicit Writer(std::string& out) : out_(out) {}
+  Writer& Letter(char c) {
+    Separate();
+    out_ += c;
+    return *this;
+  }
+  Writer& Number(long value) {
+    Separate();
+    char buf[24];
+    const auto end = std::to_chars(buf, buf + sizeof buf, value).ptr;
+    out_.append(buf, end);
+    return *this;
+  }
+  Writer& Raw(std::string_view text) {
+    Separate();
+    out_ += text;
+    return *this;
+  }
+  Writer& Quoted(std::string_view text) {
+    Separate();
+    out_ += '"';
+    AppendFieldData(out_, text);
+    out_ += '"';
+    return *this;
+  }
+  void End() { out_ += '|'; }
+
+ private:
+  void Separate() {
+    if (started_) out_ += ',';
+    started_ = true;
+  }
+  std::string& out_;
+  bool started_ = false;
+};
+
+struct Render {
+  std::string& out;
+  void operator()(const Line& p) const {
+    Writer(out).Letter('L').Letter('S').Number(p.row1).Number(p.column1).Number(p.row2)
+        .Number(p.column2).Number(p.thickness).Quoted("11111111").End();
+  }
+  void operator()(const Box& p) const {
+    Writer(out).Letter('Q').Number(p.row1).Number(p.column1).Number(p.row2).Number(p.column2)
+        .Number(p.thickness).Quoted(p.pattern).End();
+  }
+  void operator()(const Text& p) const {
+    Writer(out).Letter('C').Number(p.row).Number(p.column).Number(0).Number(p.font)
+        .Number(p.across).Number(p.down).Letter(p.style).Letter(p.align).Number(0)
+        .Number(p.rotation).Quoted(p.text).End();
+  }
+  void operator()(const Field& p) const {
+    Writer(out).Letter('T').Number(p.field).Number(p.maxLength).Letter('V').Number(p.row)
+        .Number(p.column).Number(0).Number(p.font).Number(p.across).Number(p.down)
+        .Letter(p.style).Letter(p.align).Number(0).Number(0).Number(0).End();
+  }
+  void operator()(const Barcode& p) const {
+    Writer(out).Letter('B').Number(p.field).Number(p.maxLength).Letter(p.data).Number(p.row)
+        .Number(p.column).Number(8).Number(p.density).Number(p.height).Number(8).Letter('L')
+        .Number(0).End();
+  }
+  void operator()(const FixedData& p) const {
+    Writer(out).Letter('R').Number(p.field).Quoted(p.data).End();
+  }
+  void operator()(const Graphic& p) const {
+    Writer(out).Letter('G').Number(p.number).Number(p.row).Number(p.column).Number(0).Number(0)
+        .End();
+  }
+};
+
+}  // namespace
+
+namespace {
+
+enum class Treat : unsigned char { Keep, Drop, Space };
+
+constexpr auto kTreat = [] {
+  std::array<Treat, 256> treat{};
+  for (int c = 0; c < 0x20; ++c) treat[static_cast<std::size_t>(c)] = Treat::Space;
+  treat[0x7F] = Treat::Space;
+  for (unsigned char c : {'"', '|', '{', '}'}) treat[c] = Treat::Drop;
+  return treat;
+}();
+
+}  // namespace
+
+void AppendFieldData(std::string& out, std::string_view text) {
+  std::size_t run = 0;  // start of the characters kept as they are
+  for (std::size_t i = 0; i < text.size(); ++i) {
+    const Treat treat = kTreat[static_cast<unsigned char>(text[i])];
+    if (treat == Treat::Keep) continue;
+    out.append(text.data() + run, i - run);
+    if (treat == Treat::Space) out += ' ';
+    run = i + 1;
+  }
+  out.append(text.data() + run, text.size() - run);
+}
+
+std::string FieldData(std::string_view text) {
+  std::string out;
+  out.reserve(text.size());
+  AppendFieldData(out, text);
+  return out;
+}
+
+std::string RenderFormat(std::string_view number, const Format& format) {
+  std::string out;
+  out.reserve(64 + format.packets.size() * 40);
+  out += '{';
+  Writer(out).Letter('F').Raw(FieldData(number)).Letter('A').Letter('R').Letter(format.storage)
+      .Number(format.length).Number(format.width).Quoted(format.name).End();
+  const Render render{out};
+  for (const Packet& packet : format.packets) std::visit(render, packet);
+  out += '}';
+  return out;
+}
+
+Batch::Batch(std::string_view number, int quantity, std::string_view batchMode) {
+  text_.reserve(1024);
+  text_ += '{';
+  Writer(text_).Letter('B').Raw(FieldData(number)).Letter('N').Number(quantity).End();
+  Writer(text_).Letter('E').Raw(FieldData(batchMode)).Number(0).Number(1).Number(1).Number(0)
+      .Number(1).End();
+}
+
+Batch& Batch::Field(int number, std::string_view data) {
+  Writer(text_).Number(number).Quoted(data).End();
+  return *this;
+}
+
+std::string Batch::Finish() && {
+  text_ += '}';
+  return std::move(text_);
+}
+
+}  // namespace quendal::vpcl

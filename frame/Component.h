@@ -89,6 +89,8 @@ class LabelInterface : public virtual Component {
   virtual std::string VPCLIIBatchCommand() = 0;
   virtual std::string PrintVPCLII() = 0;
   virtual std::int32_t SpooledJobCount(std::int32_t aPrinterHandle) = 0;
+  // Draws the last label on the drawn printer opened for it ("WinPCL").
+  virtual void PrintWinPCL() = 0;
 };
 
 // Members shared by consignment and row classes.

@@ -5,7 +5,10 @@
 #include <functional>
 #include <thread>
 
+#include "frame/Error.h"
 #include "frame/VB.h"
+#include "labels/VpclLabel.h"
+#include "labels/WinPrintDraw.h"
 #include "platform/Clock.h"
 #include "platform/CodePage.h"
 #include "platform/Machine.h"
@@ -190,6 +193,14 @@ bool LabelPrinter::OpenPtr() {
         }))
       return result;
     if (!installed) return result;
+    if (!proc([&] {
+          dc_ = CurrentSpooler().CreateDC(printerName_);
+          if (!dc_)
+            WriteLog(0, "OpenPtr",
+                     "Error " + std::to_string(err::kUnknownPrinter) + "Unable to open printer " +
+                         printerName_);
+        }))
+      return result;
   }
   if (!proc([&] { PumpMessages(); })) return result;
   // Hold the job back while the printer's queue is full.
@@ -205,6 +216,7 @@ bool LabelPrinter::OpenPtr() {
     return result;
   if (!proc([&] {
         if (handle_ != 0) job_ = CurrentSpooler().StartDoc(handle_, ClassName());
+        if (dc_ && dc_->StartDoc(ClassName())) dc_->StartPage();
       }))
     return result;
   return result = true;
@@ -212,6 +224,14 @@ bool LabelPrinter::OpenPtr() {
 
 void LabelPrinter::ClosePtr() {
   Procedure proc = Guard("Sub ClosePtr");
+  if (dc_) {
+    if (!proc([&] {
+          dc_->EndPage();
+          dc_->EndDoc();
+        }))
+      return;
+    dc_.reset();
+  }
   if (handle_ == 0) return;
   if (!proc([&] { CurrentSpooler().EndDoc(handle_); })) return;
   proc([&] {
@@ -222,6 +242,7 @@ void LabelPrinter::ClosePtr() {
 }
 
 void LabelPrinter::AbandonChannel() {
+  dc_.reset();  // a drawn document that never ended sends nothing
   if (handle_ == 0) return;
   const std::int32_t handle = handle_;
   handle_ = 0;
@@ -244,14 +265,26 @@ void LabelPrinter::WriteChannel(std::string_view text) {
     CurrentSpooler().Write(handle_, ToCodePage(text));
 }
 
+void LabelPrinter::PrintWinPCL() {
+  Procedure proc = Guard("Sub PrintWinPCL");
+  LabelDrawing drawing;
+  if (!proc([&] { drawing = LayOutLabel(ReadVpclLabel(PrintVPCLII(), VPCLIIBatchCommand())); }))
+    return;
+  proc([&] {
+    if (dc_) DrawLabel(*dc_, twipsPerPixelX_, twipsPerPixelY_, drawing);
+  });
+}
+
 bool LabelPrinter::WriteLabel() {
   bool result = false;
   Procedure proc = Guard("Function WriteLabel");
   std::string language;
   if (!proc([&] { language = system_->PrinterLanguage().Text(); })) return result;
   if (!proc([&] {
-        // Drawn labels have their own writer; nothing is drawn here.
-        if (language == kWinPCL) return;
+        if (language == kWinPCL) {
+          PrintWinPCL();
+          return;
+        }
         if (language == kVPCLII) {
           if (handle_ != 0) WriteChannel(VPCLIIBatchCommand());
           return;

@@ -11,12 +11,14 @@
 #pragma once
 
 #include <cstdint>
+#include <memory>
 #include <optional>
 #include <span>
 #include <string>
 #include <string_view>
 
 #include "frame/ComponentBase.h"
+#include "platform/DeviceContext.h"
 #include "labels/Vpcl.h"
 
 namespace quendal {
@@ -108,6 +110,8 @@ class LabelPrinter : public virtual LabelInterface, public ComponentBase {
   std::string VPCLIIBatchCommand() override;
   std::string PrintVPCLII() override;
   std::int32_t SpooledJobCount(std::int32_t aPrinterHandle) override;
+  // Draws the last label's format and batch on the open drawn printer.
+  void PrintWinPCL() override;
 
   // The values of the last label, and its copy count.
   const LabelValues& Values() const { return values_; }
@@ -175,6 +179,8 @@ class LabelPrinter : public virtual LabelInterface, public ComponentBase {
 
   std::int32_t handle_ = 0;
   std::int32_t job_ = 0;
+  // The drawn channel's page, while a drawn job is open.
+  std::unique_ptr<DeviceContext> dc_;
   float twipsPerPixelX_ = 0;
   float twipsPerPixelY_ = 0;
 };

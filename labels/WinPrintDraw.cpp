@@ -10,16 +10,17 @@ namespace quendal {
 
 namespace {
 
-constexpr double kTwipsPerUnit = 56.0;
+constexpr float kTwipsPerUnit = 56.0f;
 
-double Factor(float twipsPerPixel) {
-  return kTwipsPerUnit / (twipsPerPixel > 0 ? twipsPerPixel : 1.0f);
-}
+// Units to pixels in single precision, as the device's twips per pixel are
+// kept: 114 units at 4.8 twips per pixel are 1330 pixels, not 1329.99994.
+float Factor(float twipsPerPixel) { return kTwipsPerUnit / (twipsPerPixel > 0 ? twipsPerPixel : 1.0f); }
 
 // Label units to whole device pixels, rounded down.
 int Pixels(double units, float twipsPerPixel) {
-  const double px = std::floor(units * Factor(twipsPerPixel));
-  return static_cast<int>(std::clamp(px, -1e7, 1e7));
+  const float px = std::floor(static_cast<float>(units) * kTwipsPerUnit /
+                              (twipsPerPixel > 0 ? twipsPerPixel : 1.0f));
+  return static_cast<int>(std::clamp(px, -1e7f, 1e7f));
 }
 
 }  // namespace

@@ -294,6 +294,23 @@ int Main(int argc, char** argv) {
   auto* demo = app.add_subcommand("demo", "a demo day in a fresh database, running every built class");
   demo->add_option("--out", o.out, "demo folder")->capture_default_str();
 
+  // An unknown command is named as such, not as a missing one.
+  for (int i = 1; i < argc; ++i) {
+    const std::string arg = argv[i];
+    if (arg == "--db" || arg == "--now" || arg == "--spool" || arg == "--on-error") {
+      ++i;
+      continue;
+    }
+    if (arg.starts_with("-")) continue;
+    bool known = false;
+    for (const auto* sub : app.get_subcommands([](CLI::App*) { return true; }))
+      known = known || sub->get_name() == arg;
+    if (!known) {
+      std::cerr << "quendal: unknown command " << arg << " (see quendal --help)\n";
+      return 1;
+    }
+    break;
+  }
   try {
     app.parse(argc, argv);
   } catch (const CLI::Success& e) {

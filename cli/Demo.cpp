@@ -153,8 +153,10 @@ int RunDemo(const std::string& out, std::ostream& cout, bool asJson) {
         run["labels"] = json::array();
         // One Init per printer: the packs of each carrier go to that carrier's printer.
         std::map<std::string, std::vector<Ref<host::Pack>>> packsByPrinter;
-        for (const auto& conNote : conNotes)
-          for (auto pack : *conNote->Packs()) packsByPrinter[printerOf(conNote)].push_back(pack);
+        for (const auto& conNote : conNotes) {
+          const Ref<host::PackList> packs = conNote->Packs();
+          for (auto pack : *packs) packsByPrinter[printerOf(conNote)].push_back(pack);
+        }
         for (const auto& [printer, packs] : packsByPrinter) {
           const LabelRun labelRun = PrintLabels(*labels, system, printer, packs, std::nullopt);
           for (const auto& [pack, printed] : labelRun.labels)

@@ -160,8 +160,10 @@ class Command {
       if (!pack) throw UsageError("no pack " + std::to_string(id) + " in " + o_.db);
       packs.push_back(pack);
     }
-    if (o_.conNote)
-      for (auto pack : *ConNote(o_.conNote)->Packs()) packs.push_back(pack);
+    if (o_.conNote) {
+      const Ref<host::PackList> list = ConNote(o_.conNote)->Packs();
+      for (auto pack : *list) packs.push_back(pack);
+    }
     const std::int64_t lastLog = Host().LastLogId();
     LabelInterface* labels = nullptr;
     auto object = Create(entry, labels);

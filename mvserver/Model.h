@@ -82,6 +82,7 @@ struct TypeInfo {
 struct Model {
   std::vector<std::unique_ptr<TypeInfo>> types;
   std::uint32_t dataVersion = 0;
+  std::uint64_t generation = 0;  // counts invalidations: cached objects older than this are stale
 
   const TypeInfo& Type(std::string_view name) const;
   // Forgets every cached row: after any write.

@@ -145,6 +145,7 @@ const TypeInfo& Model::Type(std::string_view name) const {
 
 void Model::Invalidate() {
   for (auto& t : types) t->cache.clear();
+  ++generation;
 }
 
 namespace {
@@ -168,13 +169,19 @@ class Store {
   Model& model() { return host_->model(); }
   Database& db() { return host_->Db(); }
 
-  // The row of a record, from the cache until the next write; null when there is none.
-  const Row* ReadRow(const TypeInfo& type, std::int64_t key) {
+  // Forgets what was read when another connection changed the file; returns the generation.
+  std::uint64_t CheckVersion() {
     const std::uint32_t version = db().DataVersion();
     if (version != model().dataVersion) {
       model().Invalidate();
       model().dataVersion = version;
     }
+    return model().generation;
+  }
+
+  // The row of a record, from the cache until the next write; null when there is none.
+  const Row* ReadRow(const TypeInfo& type, std::int64_t key) {
+    CheckVersion();
     auto& cache = const_cast<TypeInfo&>(type).cache;
     if (auto it = cache.find(key); it != cache.end()) return &it->second;
     Use s(db().Prepare(type.selectRow));
@@ -291,11 +298,23 @@ class SqlRecord {
   }
   Var ResolveReference(const Member& m, std::string_view name);
   Var Items(const Member& m);
+  Var Resolve(std::string_view name, const Member& m);
 
   Store store_;
   const TypeInfo* type_;
   std::optional<std::int64_t> key_;
   std::map<std::string, Var, std::less<>> staged_;
+
+  // The objects and collections this record handed out. The record keeps them, as a
+  // host object keeps its children, so `for (auto line : *pack->Lines())` iterates a
+  // collection that is still alive; a stale one is kept (retired) rather than freed.
+  struct Handed {
+    std::uint64_t generation;
+    std::optional<std::int64_t> key;
+    Var value;
+  };
+  std::map<std::string, Handed, std::less<>> handed_;
+  std::vector<Var> retired_;
 };
 
 template <class T>
@@ -451,6 +470,29 @@ Var SqlRecord::Get(std::string_view name) {
     case MemberKind::LogId:
       if (key_) return Var(static_cast<std::int32_t>(*key_));
       if (auto it = staged_.find(name); it != staged_.end()) return it->second;
+      return {};
+    default:
+      break;
+  }
+  const std::uint64_t generation = store_.CheckVersion();
+  auto it = handed_.find(name);
+  if (it != handed_.end() && it->second.generation == generation && it->second.key == key_)
+    return it->second.value;
+  Var value = Resolve(name, m);
+  if (it == handed_.end()) {
+    handed_.emplace(std::string(name), Handed{generation, key_, value});
+  } else {
+    if (retired_.size() >= 256) retired_.erase(retired_.begin(), retired_.begin() + 128);
+    retired_.push_back(std::move(it->second.value));
+    it->second = Handed{generation, key_, value};
+  }
+  return value;
+}
+
+Var SqlRecord::Resolve(std::string_view name, const Member& m) {
+  switch (m.kind) {
+    case MemberKind::Column:
+    case MemberKind::LogId:
       return {};
     case MemberKind::Reference:
       return ResolveReference(m, name);
@@ -726,7 +768,13 @@ Var SqlRecord::Call(std::string_view method, std::span<const Var> args) {
       throw Error(err::kInvalidCall,
                   "wrong number of arguments to " + std::string(type) + "." + std::string(method),
                   "mvserver");
-    return entry.handler(*this, args);
+    Var result = entry.handler(*this, args);
+    // Collections a method returns are kept like members, for the same reason.
+    if (result.IsObject()) {
+      if (retired_.size() >= 256) retired_.erase(retired_.begin(), retired_.begin() + 128);
+      retired_.push_back(result);
+    }
+    return result;
   }
   throw NoSuchMember(type, method);
 }

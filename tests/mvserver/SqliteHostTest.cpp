@@ -252,6 +252,29 @@ TEST_F(SqliteHostTest, PackCubicAttributesAndCountsThroughSystem) {
   EXPECT_EQ(host->System()->LastError().Whole(), 8101);
 }
 
+TEST_F(SqliteHostTest, CollectionsReachedThroughTemporariesStayAliveWhileIterated) {
+  auto pack = Pack(1001);
+  std::vector<std::string> classes;
+  for (auto line : *pack->Lines()) classes.push_back(line->Product()->DGClass().Text());
+  EXPECT_EQ(classes, (std::vector<std::string>{"", "3.1"}));
+  int packs = 0;
+  for (auto other : *pack->ConNote()->Packs()) packs += other->SSCC().Text().size() == 20 ? 1 : 0;
+  EXPECT_EQ(packs, 2);
+  // A write makes the next read fresh; the collection being iterated stays valid.
+  auto manifest = host->NewManifest();
+  manifest->SetVendorId(1);
+  manifest->SetCarrierId(1);
+  ASSERT_TRUE(manifest->Save());
+  auto system = host->System();
+  for (auto c : *system->GetManifestConNotes(1, 1)) c->SetManifestId(manifest->ManifestId());
+  int seen = 0;
+  for (auto c : *manifest->ConNotes()) {
+    c->SetCubicTotal(1.0);
+    seen += manifest->ConNotes()->Count();
+  }
+  EXPECT_EQ(seen, 1);
+}
+
 TEST_F(SqliteHostTest, NewConNotesCollectsWhatIsAdded) {
   auto list = host->NewConNotes();
   EXPECT_EQ(list->Count(), 0);

@@ -30,9 +30,10 @@ Files Snapshot(const fs::path& root) {
   std::error_code ec;
   for (auto it = fs::recursive_directory_iterator(root, ec); !ec && it != fs::recursive_directory_iterator();
        it.increment(ec)) {
-    if (!it->is_regular_file(ec)) continue;
+    // Hidden files are the spooler's and the demo's bookkeeping, not output.
+    if (it->path().filename().string().starts_with(".") || !it->is_regular_file(ec)) continue;
     const std::string relative = fs::relative(it->path(), root, ec).string();
-    if (relative.starts_with(kDatabase) || relative == kMarker || relative == "demo-data.json") continue;
+    if (relative.starts_with(kDatabase) || relative == "demo-data.json") continue;
     files[relative] = it->file_size(ec);
   }
   return files;

@@ -203,8 +203,11 @@ class Store {
     return item.makeCollection(host_, &item, std::move(keys));
   }
 
-  void Wrote() {
-    model().Invalidate();
+  // After this host's own write: rows read before stay valid except `changed`, but
+  // collections and objects handed out are resolved again.
+  void Wrote(const TypeInfo* type = nullptr, std::optional<std::int64_t> changed = std::nullopt) {
+    if (type && changed) const_cast<TypeInfo&>(*type).cache.erase(*changed);
+    ++model().generation;
     model().dataVersion = db().DataVersion();
   }
 
@@ -218,7 +221,7 @@ class Store {
       s->Bind(2, key);
       s->Run();
     }
-    Wrote();
+    Wrote(&type, key);
   }
 
   // Keys (or any single integer column) a query returns.

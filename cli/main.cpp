@@ -18,6 +18,7 @@
 #include "frame/VB.h"
 #include "mvserver/SqliteHost.h"
 #include "platform/Clock.h"
+#include "platform/CupsSpooler.h"
 #include "platform/DirectorySpooler.h"
 #include "platform/Settings.h"
 
@@ -28,6 +29,7 @@ struct Options {
   std::string db = "./quendal.db";
   std::string now;
   std::string spool = "./spool";
+  bool cups = false;
   std::string onError;
   bool json = false;
 
@@ -256,7 +258,9 @@ int Main(int argc, char** argv) {
   app.fallthrough();
   app.add_option("--db", o.db, "host database (created on first use)")->capture_default_str();
   app.add_option("--now", o.now, "fix the clock: YYYY-MM-DDTHH:MM:SS");
-  app.add_option("--spool", o.spool, "directory spooler: a printer is a folder in it")->capture_default_str();
+  auto* spoolOption =
+      app.add_option("--spool", o.spool, "directory spooler: a printer is a folder in it")->capture_default_str();
+  app.add_flag("--cups", o.cups, "print through CUPS: a printer is a CUPS queue")->excludes(spoolOption);
   app.add_option("--on-error", o.onError,
                  "answer to error reports: abort, retry, ignore, or ask (default: ask on a terminal, else abort)")
       ->check(CLI::IsMember({"abort", "retry", "ignore", "ask"}));
@@ -329,7 +333,10 @@ int Main(int argc, char** argv) {
       SetNow(*now);
     }
     SetErrorPrompt(MakePrompt(o.onError, std::cin, std::cerr, isatty(STDIN_FILENO) != 0));
-    SetSpooler(std::make_shared<DirectorySpooler>(o.spool));
+    if (o.cups)
+      SetSpooler(std::make_shared<CupsSpooler>());
+    else
+      SetSpooler(std::make_shared<DirectorySpooler>(o.spool));
 
     Command command(o);
     if (*classes) return command.Classes();

@@ -4,6 +4,8 @@
 #include <sys/wait.h>
 
 #include <algorithm>
+#include <chrono>
+#include <thread>
 #include <cstdlib>
 #include <set>
 #include <filesystem>
@@ -170,6 +172,36 @@ TEST_F(CliTest, WorkCommandsRunBuiltClassesAndPrintWhatTheyReturned) {
     ExpectOneLineError(Run({"manifest", name, "--edi-doc", "8"}), 1, "no EDI document 8");
     ExpectOneLineError(Run({"manifest", name, "--edi-doc", "7", "--rows", "1,x"}), 1, "--rows");
   }
+}
+
+// --cups prints through the private CUPS server that scripts/test starts; the
+// queue's device is a file, which receives the label batch.
+TEST_F(CliTest, LabelsThroughCups) {
+  const char* queue = std::getenv("QUENDAL_CUPS_CLI_QUEUE");
+  const char* file = std::getenv("QUENDAL_CUPS_CLI_FILE");
+  if (!std::getenv("CUPS_SERVER") || !queue || !file) {
+    const char* ci = std::getenv("CI");
+    if (ci && std::string(ci) == "true") FAIL() << "CI runs a private CUPS server";
+    GTEST_SKIP() << "no private CUPS server (scripts/test starts one)";
+  }
+  ASSERT_EQ(Run({"import", Example()}).status, 0);
+  const Result r = Run({"--cups", "--json", "label", "clsStarTrackGenericSCM", "--pack", "1001",
+                        "--printer", queue});
+  ASSERT_EQ(r.status, 0) << r.err;
+  EXPECT_TRUE(r.Json()["log"].empty()) << r.out;  // the queue was found: no "Error 1801"
+  // The server delivers asynchronously: wait for the batch of pack 1001.
+  std::string delivered;
+  for (int i = 0; i < 200 && delivered.find("(00)093123450000000012") == std::string::npos; ++i) {
+    delivered = test::ReadText(file);
+    std::this_thread::sleep_for(std::chrono::milliseconds(50));
+  }
+  EXPECT_NE(delivered.find("{B,430,N,1|"), std::string::npos) << delivered;
+  const Result unknown =
+      Run({"--cups", "--json", "label", "clsStarTrackGenericSCM", "--pack", "1001", "--printer", "no-such-queue"});
+  ASSERT_EQ(unknown.status, 0) << unknown.err;
+  EXPECT_NE(unknown.out.find("Error 1801Unable to open printer no-such-queue"), std::string::npos)
+      << unknown.out;
+  ExpectOneLineError(Run({"--cups", "--spool", "x", "classes"}), 1, "excludes");
 }
 
 TEST_F(CliTest, DemoBuildsADayRunsWhatIsBuiltAndReplacesItsOwnFolderOnly) {

@@ -1,0 +1,37 @@
+// The demo's despatch day as one host-data JSON document: a vendor, a
+// carrier for every carrier the catalogue names (each with its account,
+// folder and label printer), distribution centres and stores, about thirty
+// consignments of one to nine packs dated today, an ASN per despatch and an
+// EDI document per carrier.
+#pragma once
+
+#include <cstdint>
+#include <string>
+#include <vector>
+
+#include "cli/Cli.h"
+#include "frame/Var.h"
+
+namespace quendal::cli {
+
+struct DemoCarrier {
+  std::int32_t carrierId;
+  std::int32_t ediDocumentId;
+  std::string name;     // as the catalogue names the carrier
+  std::string printer;  // its label printer (a folder of the directory spooler)
+  std::string folder;   // its FileFolder, ending in "/"
+};
+
+struct DemoData {
+  json document;
+  std::vector<DemoCarrier> carriers;
+  std::string documentPrinter;
+};
+
+// `root` is the demo folder (absolute); carrier folders lie under root/carriers/.
+DemoData BuildDemoData(const std::string& root, DateTime now);
+
+// The SSCC "00" + extension digit, company prefix, serial and GS1 check digit.
+std::string DemoSscc(std::int64_t serial);
+
+}  // namespace quendal::cli

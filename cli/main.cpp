@@ -1,0 +1,369 @@
+// quendal: the command line over the library and the reference host.
+//
+// Exit status: 0 when the command ran (whatever the component returned,
+// which is printed), 1 on bad usage or bad input (one line saying why), 2
+// when the database or a file can't be opened.
+#include <unistd.h>
+
+#include <CLI/CLI.hpp>
+#include <filesystem>
+#include <fstream>
+#include <iostream>
+#include <sstream>
+
+#include "cli/Cli.h"
+#include "cli/Demo.h"
+#include "cli/Prompt.h"
+#include "cli/Work.h"
+#include "frame/VB.h"
+#include "mvserver/SqliteHost.h"
+#include "platform/Clock.h"
+#include "platform/CupsSpooler.h"
+#include "platform/DirectorySpooler.h"
+#include "platform/Settings.h"
+
+namespace quendal::cli {
+namespace {
+
+struct Options {
+  std::string db = "./quendal.db";
+  std::string now;
+  std::string spool = "./spool";
+  bool cups = false;
+  std::string onError;
+  bool json = false;
+
+  std::string file;
+  std::int64_t since = 0;
+  std::string className;
+  std::string value;
+  std::vector<std::int64_t> packs;
+  std::int64_t conNote = 0;
+  std::string printer;
+  std::int16_t qty = 0;
+  std::string language;
+  std::int16_t ediDoc = 0;
+  std::string rows = "all";
+  std::string out = "./quendal-demo";
+};
+
+class Command {
+ public:
+  explicit Command(Options& o) : o_(o) {}
+
+  mvserver::SqliteHost& Host() {
+    if (!host_) {
+      try {
+        host_ = mvserver::SqliteHost::Open(o_.db);
+      } catch (const mvserver::OpenError& e) {
+        throw OpenFailure(e.what());
+      }
+      host::RegisterLibrary(host_);
+    }
+    return *host_;
+  }
+
+  void Emit(const json& result, const std::function<void()>& text) {
+    if (o_.json)
+      std::cout << result.dump(2) << "\n";
+    else
+      text();
+  }
+
+  int Classes() {
+    json list = json::array();
+    std::vector<std::vector<std::string>> rows;
+    int built = 0;
+    for (const auto& entry : Catalogue()) {
+      const bool ready = entry.factory != nullptr;
+      built += ready ? 1 : 0;
+      list.push_back({{"identifier", entry.Identifier()}, {"family", FamilyName(entry.family)},
+                      {"carrier", entry.carrier}, {"fileOrRetailer", entry.retailerOrFile}, {"built", ready}});
+      rows.push_back({entry.Identifier(), std::string(FamilyName(entry.family)), std::string(entry.carrier),
+                      std::string(entry.retailerOrFile), ready ? "yes" : "not yet"});
+    }
+    Emit({{"classes", list}, {"built", built}, {"total", list.size()}}, [&] {
+      PrintTable(std::cout, {"Identifier", "Family", "Carrier", "File/retailer", "Built"}, rows);
+      std::cout << built << " of " << list.size() << " classes built\n";
+    });
+    return 0;
+  }
+
+  int Import() {
+    std::ifstream in(o_.file, std::ios::binary);
+    if (!in) throw OpenFailure("cannot read " + o_.file);
+    std::ostringstream text;
+    text << in.rdbuf();
+    mvserver::ImportSummary summary;
+    try {
+      summary = Host().Import(text.str());
+    } catch (const mvserver::ImportError& e) {
+      throw UsageError(o_.file + ": " + e.what());
+    }
+    json records = json::object();
+    for (const auto& [collection, count] : summary.records) records[collection] = count;
+    Emit({{"database", o_.db}, {"file", o_.file}, {"records", records}, {"total", summary.total}}, [&] {
+      std::cout << "Imported " << summary.total << " records from " << o_.file << " into " << o_.db;
+      std::string sep = ": ";
+      for (const auto& [collection, count] : summary.records) {
+        std::cout << sep << collection << " " << count;
+        sep = ", ";
+      }
+      std::cout << "\n";
+    });
+    return 0;
+  }
+
+  int Log() {
+    if (o_.since < 0) throw UsageError("--since takes a log id (0 or more)");
+    const auto logs = Host().LogsSince(o_.since);
+    Emit({{"entries", LogsJson(logs)}}, [&] { PrintLogs(std::cout, logs); });
+    return 0;
+  }
+
+  int Settings(bool set) {
+    const CatalogueEntry* entry = FindClass(o_.className);
+    if (!entry) throw UsageError("no class " + o_.className + " in the catalogue (see quendal classes)");
+    const std::string key(entry->className);
+    if (set) {
+      // The classes read the switch as a flag; refuse what they could not read.
+      try {
+        TextToFlag(o_.value);
+      } catch (const std::exception&) {
+        throw UsageError("the printing switch takes True, False or a number, not \"" + o_.value + "\"");
+      }
+      if (!SaveSetting("Merivane", "Settings", key, o_.value))
+        throw OpenFailure("cannot write " + SettingsPath("Merivane"));
+    }
+    const std::string value = GetSetting("Merivane", "Settings", key, "True");
+    Emit({{"class", entry->Identifier()}, {"key", key}, {"value", value}},
+         [&] { std::cout << entry->Identifier() << ": " << value << "\n"; });
+    return 0;
+  }
+
+  Ref<host::System> System() {
+    Ref<host::System> system = Host().System();
+    if (!o_.language.empty()) system = OverrideSystem(system, "PrinterLanguage", Var(o_.language));
+    return system;
+  }
+
+  Ref<host::ConNote> ConNote(std::int64_t id) {
+    auto conNote = Host().Find<host::ConNote>("ConNote", id);
+    if (!conNote) throw UsageError("no consignment " + std::to_string(id) + " in " + o_.db);
+    return conNote;
+  }
+
+  int Label() {
+    const CatalogueEntry& entry = BuiltClass(o_.className, Family::Label);
+    if (o_.packs.empty() == (o_.conNote == 0)) throw UsageError("label needs --pack ID ... or --connote ID");
+    std::vector<Ref<host::Pack>> packs;
+    for (auto id : o_.packs) {
+      auto pack = Host().Find<host::Pack>("Pack", id);
+      if (!pack) throw UsageError("no pack " + std::to_string(id) + " in " + o_.db);
+      packs.push_back(pack);
+    }
+    if (o_.conNote) {
+      const Ref<host::PackList> list = ConNote(o_.conNote)->Packs();
+      for (auto pack : *list) packs.push_back(pack);
+    }
+    const std::int64_t lastLog = Host().LastLogId();
+    LabelInterface* labels = nullptr;
+    auto object = Create(entry, labels);
+    const auto qty = o_.qty ? std::optional<std::int16_t>(o_.qty) : std::nullopt;
+    const LabelRun run = PrintLabels(*labels, System(), o_.printer, packs, qty);
+    const auto logs = Host().LogsSince(lastLog);
+    json results = json::array();
+    for (const auto& [pack, printed] : run.labels) results.push_back({{"pack", pack}, {"printed", printed}});
+    Emit({{"class", entry.Identifier()}, {"printer", o_.printer}, {"init", run.init}, {"labels", results},
+          {"log", LogsJson(logs)}},
+         [&] {
+           std::cout << entry.Identifier() << " Init(\"" << o_.printer << "\"): " << (run.init ? "True" : "False") << "\n";
+           for (const auto& [pack, printed] : run.labels)
+             std::cout << "PrintLabel pack " << pack << ": " << (printed ? "True" : "False") << "\n";
+           PrintLogs(std::cout, logs);
+         });
+    return 0;
+  }
+
+  int Despatch() {
+    const CatalogueEntry& entry = BuiltClass(o_.className, Family::Consignment);
+    auto conNote = ConNote(o_.conNote);
+    const std::int64_t lastLog = Host().LastLogId();
+    ConsignmentInterface* consignment = nullptr;
+    auto object = Create(entry, consignment);
+    const LogList vtErrorLog = cli::Despatch(*consignment, System(), conNote);
+    const auto logs = Host().LogsSince(lastLog);
+    Emit({{"class", entry.Identifier()}, {"connote", o_.conNote}, {"vtErrorLog", vtErrorLog},
+          {"log", LogsJson(logs)}},
+         [&] {
+           std::cout << entry.Identifier() << " Process consignment " << o_.conNote << ": vtErrorLog (";
+           for (std::size_t i = 0; i < vtErrorLog.size(); ++i) std::cout << (i ? ", " : "") << vtErrorLog[i];
+           std::cout << ")\n";
+           PrintLogs(std::cout, logs);
+         });
+    return 0;
+  }
+
+  std::optional<std::vector<std::int32_t>> ChosenRows() {
+    if (o_.rows == "all") return std::nullopt;
+    std::vector<std::int32_t> rows;
+    std::stringstream list(o_.rows);
+    std::string item;
+    while (std::getline(list, item, ',')) {
+      const std::string t = Trim(item);
+      if (t.empty() || t.size() > 9 || t.find_first_not_of("0123456789") != std::string::npos)
+        throw UsageError("--rows takes all or row numbers N,N,... (from 0), not \"" + o_.rows + "\"");
+      rows.push_back(std::stoi(t));
+    }
+    if (rows.empty()) throw UsageError("--rows takes all or row numbers N,N,... (from 0)");
+    return rows;
+  }
+
+  int Manifest() {
+    const CatalogueEntry& entry = BuiltClass(o_.className, Family::Rows);
+    const auto chosen = ChosenRows();
+    if (!Host().Find("EDIDocument", o_.ediDoc))
+      throw UsageError("no EDI document " + std::to_string(o_.ediDoc) + " in " + o_.db);
+    const std::int64_t lastLog = Host().LastLogId();
+    RowInterface* rows = nullptr;
+    auto object = Create(entry, rows);
+    const RowRun run = RunRows(*rows, System(), o_.ediDoc, chosen);
+    const auto logs = Host().LogsSince(lastLog);
+    json processed = json::array();
+    for (const auto& [row, result] : run.processed) processed.push_back({{"row", row}, {"result", result}});
+    Emit({{"class", entry.Identifier()}, {"ediDocument", o_.ediDoc}, {"init", run.init},
+          {"columns", GridJson(run.columns)}, {"loaded", run.loaded}, {"rows", GridJson(run.rows)},
+          {"processed", processed}, {"term", run.term}, {"vtErrorLog", run.vtErrorLog}, {"log", LogsJson(logs)}},
+         [&] {
+           std::cout << entry.Identifier() << " Init(EDI document " << o_.ediDoc
+                     << "): " << (run.init ? "True" : "False") << "\nLoad: " << run.loaded << " rows\n";
+           PrintGrid(std::cout, run.columns, run.rows);
+           for (const auto& [row, result] : run.processed)
+             std::cout << "Process row " << row << ": " << result << "\n";
+           std::cout << "Term: " << (run.term ? "True" : "False") << "\n";
+           PrintLogs(std::cout, logs);
+         });
+    return 0;
+  }
+
+ private:
+  Options& o_;
+  std::shared_ptr<mvserver::SqliteHost> host_;
+};
+
+int Main(int argc, char** argv) {
+  Options o;
+  CLI::App app{"Carrier labels, despatch-advice files and manifests on the reference host.", "quendal"};
+  app.require_subcommand(1, 1);
+  app.fallthrough();
+  app.add_option("--db", o.db, "host database (created on first use)")->capture_default_str();
+  app.add_option("--now", o.now, "fix the clock: YYYY-MM-DDTHH:MM:SS");
+  auto* spoolOption =
+      app.add_option("--spool", o.spool, "directory spooler: a printer is a folder in it")->capture_default_str();
+  app.add_flag("--cups", o.cups, "print through CUPS: a printer is a CUPS queue")->excludes(spoolOption);
+  app.add_option("--on-error", o.onError,
+                 "answer to error reports: abort, retry, ignore, or ask (default: ask on a terminal, else abort)")
+      ->check(CLI::IsMember({"abort", "retry", "ignore", "ask"}));
+  app.add_flag("--json", o.json, "print the result as JSON");
+
+  auto* classes = app.add_subcommand("classes", "the catalogue: identifier, family, carrier, file/retailer, built");
+  auto* import = app.add_subcommand("import", "load a host-data JSON document into the database");
+  import->add_option("FILE", o.file, "host-data JSON document")->required();
+  auto* log = app.add_subcommand("log", "host log entries");
+  log->add_option("--since", o.since, "only entries after this log id");
+  auto* settings = app.add_subcommand("settings", "the per-class printing switch");
+  settings->require_subcommand(1, 1);
+  auto* get = settings->add_subcommand("get", "show a class's printing switch (default True)");
+  get->add_option("CLASS", o.className, "class name")->required();
+  auto* set = settings->add_subcommand("set", "set a class's printing switch");
+  set->add_option("CLASS", o.className, "class name")->required();
+  set->add_option("VALUE", o.value, "True, False or a number")->required();
+
+  auto* label = app.add_subcommand("label", "Init once, then PrintLabel per pack");
+  label->add_option("CLASS", o.className, "label class")->required();
+  auto* packOption = label->add_option("--pack", o.packs, "pack ids")->expected(1, -1);
+  auto* conNoteOption = label->add_option("--connote", o.conNote, "every pack of this consignment");
+  packOption->excludes(conNoteOption);
+  label->add_option("--printer", o.printer, "printer name");
+  label->add_option("--qty", o.qty, "copies")->check(CLI::Range(1, 32767));
+  label->add_option("--language", o.language, "overrides System.PrinterLanguage for this command");
+
+  auto* despatch = app.add_subcommand("despatch", "Process(System, ConNote, ASN of its first pack, its packs)");
+  despatch->add_option("CLASS", o.className, "consignment class")->required();
+  despatch->add_option("--connote", o.conNote, "consignment id")->required();
+
+  auto* manifest = app.add_subcommand("manifest", "Init, Load, Process the rows, Term");
+  manifest->add_option("CLASS", o.className, "row class")->required();
+  manifest->add_option("--edi-doc", o.ediDoc, "EDI document id")->required();
+  manifest->add_option("--rows", o.rows, "all, or row numbers from 0: N,N,...")->capture_default_str();
+
+  auto* demo = app.add_subcommand("demo", "a demo day in a fresh database, running every built class");
+  demo->add_option("--out", o.out, "demo folder")->capture_default_str();
+
+  // An unknown command is named as such, not as a missing one.
+  for (int i = 1; i < argc; ++i) {
+    const std::string arg = argv[i];
+    if (arg == "--db" || arg == "--now" || arg == "--spool" || arg == "--on-error") {
+      ++i;
+      continue;
+    }
+    if (arg.starts_with("-")) continue;
+    bool known = false;
+    for (const auto* sub : app.get_subcommands([](CLI::App*) { return true; }))
+      known = known || sub->get_name() == arg;
+    if (!known) {
+      std::cerr << "quendal: unknown command " << arg << " (see quendal --help)\n";
+      return 1;
+    }
+    break;
+  }
+  try {
+    app.parse(argc, argv);
+  } catch (const CLI::Success& e) {
+    return app.exit(e);
+  } catch (const CLI::ParseError& e) {
+    std::cerr << "quendal: " << e.what() << " (see quendal --help)\n";
+    return 1;
+  }
+
+  try {
+    if (!o.now.empty()) {
+      const auto now = DateTime::Parse(o.now);
+      if (!now) throw UsageError("--now takes YYYY-MM-DDTHH:MM:SS, not \"" + o.now + "\"");
+      SetNow(*now);
+    }
+    SetErrorPrompt(MakePrompt(o.onError, std::cin, std::cerr, isatty(STDIN_FILENO) != 0));
+    if (o.cups)
+      SetSpooler(std::make_shared<CupsSpooler>());
+    else
+      SetSpooler(std::make_shared<DirectorySpooler>(o.spool));
+
+    Command command(o);
+    if (*classes) return command.Classes();
+    if (*import) return command.Import();
+    if (*log) return command.Log();
+    if (*settings) return command.Settings(set->parsed());
+    if (*label) return command.Label();
+    if (*despatch) return command.Despatch();
+    if (*manifest) return command.Manifest();
+    if (*demo) return RunDemo(o.out, std::cout, o.json);
+  } catch (const UsageError& e) {
+    std::cerr << "quendal: " << e.what() << "\n";
+    return 1;
+  } catch (const OpenFailure& e) {
+    std::cerr << "quendal: " << e.what() << "\n";
+    return 2;
+  } catch (const std::filesystem::filesystem_error& e) {
+    std::cerr << "quendal: " << e.what() << "\n";
+    return 2;
+  } catch (const std::exception& e) {
+    std::cerr << "quendal: " << e.what() << "\n";
+    return 1;
+  }
+  return 1;
+}
+
+}  // namespace
+}  // namespace quendal::cli
+
+int main(int argc, char** argv) { return quendal::cli::Main(argc, argv); }

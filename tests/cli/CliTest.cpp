@@ -1,0 +1,261 @@
+// Runs the built quendal command in a temporary folder and checks its exit
+// status, its one-line errors and its JSON output.
+#include <gtest/gtest.h>
+#include <sys/wait.h>
+
+#include <algorithm>
+#include <chrono>
+#include <thread>
+#include <cstdlib>
+#include <set>
+#include <filesystem>
+#include <nlohmann/json.hpp>
+
+#include "frame/Catalogue.h"
+#include "tests/mvserver/TempFolder.h"
+
+namespace quendal {
+namespace {
+
+using nlohmann::json;
+using test::TempFolder;
+
+struct Result {
+  int status;
+  std::string out;
+  std::string err;
+  json Json() const { return json::parse(out); }
+};
+
+std::string Quote(const std::string& arg) {
+  std::string quoted = "'";
+  for (char c : arg) quoted += c == '\'' ? std::string("'\\''") : std::string(1, c);
+  return quoted + "'";
+}
+
+class CliTest : public ::testing::Test {
+ protected:
+  Result Run(const std::vector<std::string>& args) {
+    std::string command = "cd " + Quote(folder.path()) + " && XDG_CONFIG_HOME=" + Quote(folder / "config") +
+                          " QUENDAL_NOW=2024-03-14T09:30:00 " + Quote(QUENDAL_CLI_PATH);
+    for (const auto& arg : args) command += " " + Quote(arg);
+    command += " </dev/null >" + Quote(folder / "out.txt") + " 2>" + Quote(folder / "err.txt");
+    const int raw = std::system(command.c_str());
+    return {WIFEXITED(raw) ? WEXITSTATUS(raw) : -1, test::ReadText(folder / "out.txt"),
+            test::ReadText(folder / "err.txt")};
+  }
+  static void ExpectOneLineError(const Result& r, int status, const std::string& text) {
+    EXPECT_EQ(r.status, status) << r.err;
+    EXPECT_NE(r.err.find(text), std::string::npos) << r.err;
+    EXPECT_EQ(std::count(r.err.begin(), r.err.end(), '\n'), 1) << r.err;
+  }
+  std::string Example() const { return QUENDAL_MVSERVER_FIXTURES "/example-day.json"; }
+  // A class of the family that is built, or not built, if the catalogue has one.
+  static const CatalogueEntry* Find(Family family, bool built) {
+    for (const auto& entry : Catalogue())
+      if (entry.family == family && (entry.factory != nullptr) == built) return &entry;
+    return nullptr;
+  }
+
+  TempFolder folder;
+};
+
+TEST_F(CliTest, ClassesListsTheWholeCatalogue) {
+  const Result text = Run({"classes"});
+  EXPECT_EQ(text.status, 0);
+  EXPECT_NE(text.out.find("Quendal.clsStarTrackGenericSCM"), std::string::npos);
+  const Result r = Run({"classes", "--json"});
+  ASSERT_EQ(r.status, 0) << r.err;
+  const json j = r.Json();
+  ASSERT_EQ(j["classes"].size(), Catalogue().size());
+  EXPECT_EQ(j["classes"][1]["identifier"], "Quendal.clsTNTDAet11");
+  EXPECT_EQ(j["classes"][1]["family"], "consignment");
+  EXPECT_EQ(j["classes"][1]["carrier"], "TNT");
+  int built = 0;
+  for (const auto& entry : Catalogue()) built += entry.factory ? 1 : 0;
+  EXPECT_EQ(j["built"], built);
+}
+
+TEST_F(CliTest, ImportReportsWhatItLoadedAndRefusesBadInputWithOneLine) {
+  const Result r = Run({"--json", "import", Example()});
+  ASSERT_EQ(r.status, 0) << r.err;
+  EXPECT_EQ(r.Json()["total"], 23);
+  EXPECT_EQ(r.Json()["records"]["Packs"], 3);
+  EXPECT_TRUE(std::filesystem::exists(folder / "quendal.db"));
+
+  ExpectOneLineError(Run({"import", Example()}), 1, "Vendors[0].VendorId: VendorId 1 already exists");
+  test::WriteText(folder / "bad.json", R"({"Packs": [{"PackId": 9, "ConNoteId": 77}]})");
+  ExpectOneLineError(Run({"import", "bad.json"}), 1, "bad.json: Packs[0].ConNoteId: no ConNote 77");
+  test::WriteText(folder / "broken.json", "{\"Packs\": [");
+  ExpectOneLineError(Run({"import", "broken.json"}), 1, "invalid JSON");
+  ExpectOneLineError(Run({"import", "missing.json"}), 2, "cannot read missing.json");
+  ExpectOneLineError(Run({"--db", "no/such/folder/q.db", "import", Example()}), 2, "cannot open database");
+  test::WriteText(folder / "text.db", "not a database at all, only words, words and more words....");
+  ExpectOneLineError(Run({"--db", "text.db", "log"}), 2, "text.db");
+}
+
+TEST_F(CliTest, LogListsEntriesSinceAnId) {
+  test::WriteText(folder / "logs.json",
+                  R"({"Logs": [{"LogId": 1, "Message": "first", "Source": "Quendal.clsX"},
+                               {"LogId": 2, "Message": "second", "ErrorNumber": 53}]})");
+  ASSERT_EQ(Run({"import", "logs.json"}).status, 0);
+  const Result r = Run({"log", "--since", "1", "--json"});
+  ASSERT_EQ(r.status, 0) << r.err;
+  ASSERT_EQ(r.Json()["entries"].size(), 1u);
+  EXPECT_EQ(r.Json()["entries"][0]["Message"], "second");
+  EXPECT_EQ(r.Json()["entries"][0]["ErrorNumber"], 53);
+  const Result text = Run({"log"});
+  EXPECT_NE(text.out.find("first"), std::string::npos);
+  ExpectOneLineError(Run({"log", "--since", "x"}), 1, "--since");
+}
+
+TEST_F(CliTest, SettingsStoreThePrintingSwitchPerClass) {
+  const Result initial = Run({"settings", "get", "clsStarTrackGenericSCM", "--json"});
+  ASSERT_EQ(initial.status, 0) << initial.err;
+  EXPECT_EQ(initial.Json()["value"], "True");
+  EXPECT_EQ(initial.Json()["key"], "clsStarTrackGenericSCM");
+  ASSERT_EQ(Run({"settings", "set", "Quendal.clsStarTrackGenericSCM", "False"}).status, 0);
+  EXPECT_EQ(Run({"--json", "settings", "get", "clsStarTrackGenericSCM"}).Json()["value"], "False");
+  EXPECT_NE(test::ReadText(folder / "config/Merivane/settings.ini").find("clsStarTrackGenericSCM=False"),
+            std::string::npos);
+  ExpectOneLineError(Run({"settings", "set", "clsStarTrackGenericSCM", "maybe"}), 1, "True, False");
+  ExpectOneLineError(Run({"settings", "get", "clsNoSuchThing"}), 1, "no class clsNoSuchThing");
+  EXPECT_EQ(Run({"settings", "get"}).status, 1);
+}
+
+TEST_F(CliTest, WorkCommandsCheckTheClassBeforeTheyRunIt) {
+  ASSERT_EQ(Run({"import", Example()}).status, 0);
+  ExpectOneLineError(Run({"label", "clsTNTDAet11", "--pack", "1001"}), 1, "is a consignment class");
+  ExpectOneLineError(Run({"despatch", "clsStarTrackGenericSCM", "--connote", "101"}), 1, "is a label class");
+  ExpectOneLineError(Run({"manifest", "clsNoSuchThing", "--edi-doc", "7"}), 1, "no class clsNoSuchThing");
+  ExpectOneLineError(Run({"label", "clsStarTrackGenericSCM", "--pack", "1001", "--connote", "101"}), 1,
+                     "excludes");
+  ExpectOneLineError(Run({"--now", "14/03/2024", "classes"}), 1, "--now");
+  ExpectOneLineError(Run({"--on-error", "shrug", "classes"}), 1, "shrug");
+  ExpectOneLineError(Run({"frobnicate"}), 1, "frobnicate");
+  if (const auto* entry = Find(Family::Label, false))
+    ExpectOneLineError(Run({"label", std::string(entry->className), "--pack", "1001"}), 1,
+                       "is not built yet");
+  if (const auto* entry = Find(Family::Consignment, false))
+    ExpectOneLineError(Run({"despatch", std::string(entry->className), "--connote", "101"}), 1,
+                       "is not built yet");
+  if (const auto* entry = Find(Family::Rows, false))
+    ExpectOneLineError(Run({"manifest", std::string(entry->className), "--edi-doc", "7"}), 1,
+                       "is not built yet");
+}
+
+TEST_F(CliTest, WorkCommandsRunBuiltClassesAndPrintWhatTheyReturned) {
+  ASSERT_EQ(Run({"import", Example()}).status, 0);
+  std::filesystem::create_directories(folder / "spool/Labels");
+  if (const auto* entry = Find(Family::Label, true)) {
+    const std::string name(entry->className);
+    const Result r = Run({"--json", "label", name, "--pack", "1001", "1002", "--printer", "Labels"});
+    ASSERT_EQ(r.status, 0) << r.err;
+    ASSERT_EQ(r.Json()["labels"].size(), 2u);
+    EXPECT_EQ(r.Json()["labels"][1]["pack"], 1002);
+    EXPECT_TRUE(r.Json()["log"].is_array());
+    ExpectOneLineError(Run({"label", name, "--pack", "999"}), 1, "no pack 999");
+    ExpectOneLineError(Run({"label", name}), 1, "--pack ID ... or --connote ID");
+  }
+  if (const auto* entry = Find(Family::Consignment, true)) {
+    const std::string name(entry->className);
+    const Result r = Run({"--json", "despatch", name, "--connote", "101"});
+    ASSERT_EQ(r.status, 0) << r.err;
+    EXPECT_TRUE(r.Json()["vtErrorLog"].is_array());
+    ExpectOneLineError(Run({"despatch", name, "--connote", "5"}), 1, "no consignment 5");
+  }
+  if (const auto* entry = Find(Family::Rows, true)) {
+    const std::string name(entry->className);
+    const Result r = Run({"--json", "manifest", name, "--edi-doc", "7"});
+    ASSERT_EQ(r.status, 0) << r.err;
+    EXPECT_TRUE(r.Json()["rows"].is_array());
+    ExpectOneLineError(Run({"manifest", name, "--edi-doc", "8"}), 1, "no EDI document 8");
+    ExpectOneLineError(Run({"manifest", name, "--edi-doc", "7", "--rows", "1,x"}), 1, "--rows");
+  }
+}
+
+// --cups prints through the private CUPS server that scripts/test starts; the
+// queue's device is a file, which receives the label batch.
+TEST_F(CliTest, LabelsThroughCups) {
+  const char* queue = std::getenv("QUENDAL_CUPS_CLI_QUEUE");
+  const char* file = std::getenv("QUENDAL_CUPS_CLI_FILE");
+  if (!std::getenv("CUPS_SERVER") || !queue || !file) {
+    const char* ci = std::getenv("CI");
+    if (ci && std::string(ci) == "true") FAIL() << "CI runs a private CUPS server";
+    GTEST_SKIP() << "no private CUPS server (scripts/test starts one)";
+  }
+  ASSERT_EQ(Run({"import", Example()}).status, 0);
+  const Result r = Run({"--cups", "--json", "label", "clsStarTrackGenericSCM", "--pack", "1001",
+                        "--printer", queue});
+  ASSERT_EQ(r.status, 0) << r.err;
+  EXPECT_TRUE(r.Json()["log"].empty()) << r.out;  // the queue was found: no "Error 1801"
+  // The server delivers asynchronously: wait for the batch of pack 1001.
+  std::string delivered;
+  for (int i = 0; i < 200 && delivered.find("(00)093123450000000012") == std::string::npos; ++i) {
+    delivered = test::ReadText(file);
+    std::this_thread::sleep_for(std::chrono::milliseconds(50));
+  }
+  EXPECT_NE(delivered.find("{B,430,N,1|"), std::string::npos) << delivered;
+  const Result unknown =
+      Run({"--cups", "--json", "label", "clsStarTrackGenericSCM", "--pack", "1001", "--printer", "no-such-queue"});
+  ASSERT_EQ(unknown.status, 0) << unknown.err;
+  EXPECT_NE(unknown.out.find("Error 1801Unable to open printer no-such-queue"), std::string::npos)
+      << unknown.out;
+  ExpectOneLineError(Run({"--cups", "--spool", "x", "classes"}), 1, "excludes");
+}
+
+TEST_F(CliTest, DemoBuildsADayRunsWhatIsBuiltAndReplacesItsOwnFolderOnly) {
+  const Result r = Run({"demo", "--out", "day", "--json"});
+  ASSERT_EQ(r.status, 0) << r.err;
+  const json j = r.Json();
+  EXPECT_EQ(j["now"], "2024-03-14T09:30:00");
+  const json& data = j["data"];
+  EXPECT_EQ(data["vendors"], 1);
+  EXPECT_EQ(data["consignments"], 30);
+  EXPECT_EQ(data["asns"], 30);
+  EXPECT_GE(data["packs"].get<int>(), 30);
+  EXPECT_LE(data["packs"].get<int>(), 270);
+  EXPECT_GT(data["pallets"].get<int>(), 0);
+  EXPECT_GT(data["satchels"].get<int>(), 0);
+  EXPECT_GT(data["dangerousGoodsPacks"].get<int>(), 0);
+  EXPECT_EQ(data["carriers"], data["ediDocuments"]);
+  EXPECT_EQ(j["catalogue"]["total"], Catalogue().size());
+  EXPECT_EQ(j["runs"].size(), j["catalogue"]["built"].get<std::size_t>());
+
+  // The demo's document names every catalogue carrier, dates today, and the folders exist.
+  const json day = json::parse(test::ReadText(folder / "day/demo-data.json"));
+  std::set<std::string> carriers;
+  for (const auto& c : day["Carriers"]) {
+    carriers.insert(c["Name"]);
+    EXPECT_TRUE(std::filesystem::is_directory(c["FileFolder"].get<std::string>())) << c["FileFolder"];
+    EXPECT_TRUE(std::filesystem::is_directory(folder / "day/spool/" + c["Name"].get<std::string>() + " Labels"));
+    if (c["Name"] == "DFE") {
+      EXPECT_EQ(c["AccountNumber"].get<std::string>().size(), 5u);
+    }
+  }
+  for (const auto& entry : Catalogue())
+    if (entry.carrier != "any") {
+      EXPECT_TRUE(carriers.count(std::string(entry.carrier))) << entry.carrier;
+    }
+  for (const auto& c : day["ConNotes"]) EXPECT_TRUE(c["ConNoteDate"].get<std::string>().starts_with("2024-03-14T"));
+  std::set<std::string> classes;
+  for (const auto& p : day["Products"])
+    if (p["IsDangerous"].get<bool>()) classes.insert(p["DGClass"]);
+  EXPECT_EQ(classes, (std::set<std::string>{"2.1", "3.1", "5.1"}));
+
+  // A second run replaces the first one's database instead of adding to it.
+  const Result again = Run({"demo", "--out", "day", "--json"});
+  ASSERT_EQ(again.status, 0) << again.err;
+  EXPECT_EQ(again.Json()["data"]["consignments"], 30);
+  // The demo's document goes through the ordinary import too.
+  const Result imported = Run({"--db", "copy.db", "--json", "import", "day/demo-data.json"});
+  ASSERT_EQ(imported.status, 0) << imported.err;
+  EXPECT_EQ(imported.Json()["records"]["ConNotes"], 30);
+  // A folder holding a database the demo did not make is left alone.
+  ASSERT_EQ(Run({"import", Example()}).status, 0);
+  ExpectOneLineError(Run({"demo", "--out", "."}), 1, "the demo did not make");
+  EXPECT_TRUE(std::filesystem::exists(folder / "quendal.db"));
+}
+
+}  // namespace
+}  // namespace quendal

@@ -18,6 +18,9 @@ namespace fs = std::filesystem;
 
 namespace {
 
+// The ordinary printer of a carrier, on which the demo draws a label.
+std::string DrawnPrinter(const std::string& carrier) { return carrier + " Drawn"; }
+
 // Marks a folder the demo made, so a later run may replace what is in it.
 constexpr const char* kMarker = ".quendal-demo";
 constexpr const char* kDatabase = "quendal.db";
@@ -105,6 +108,10 @@ int RunDemo(const std::string& out, std::ostream& cout, bool asJson) {
   for (const auto& carrier : data.carriers) {
     fs::create_directories(root / "spool" / SafeFileName(carrier.printer));
     fs::create_directories(carrier.folder);
+    // An ordinary printer per carrier, on which one label is drawn as a picture.
+    const fs::path drawn = root / "spool" / SafeFileName(DrawnPrinter(carrier.name));
+    fs::create_directories(drawn);
+    std::ofstream(drawn / "printer.ini") << "dpi=300\n";
   }
   fs::create_directories(root / "spool" / SafeFileName(data.documentPrinter));
 
@@ -162,6 +169,21 @@ int RunDemo(const std::string& out, std::ostream& cout, bool asJson) {
           const LabelRun labelRun = PrintLabels(*labels, system, printer, packs, std::nullopt);
           for (const auto& [pack, printed] : labelRun.labels)
             run["labels"].push_back({{"pack", pack}, {"printer", printer}, {"printed", printed}});
+        }
+        // The first of the carrier's labels once more, drawn on an ordinary printer as a PNG page.
+        if (!conNotes.empty() && conNotes.front()->Packs()->Count() > 0) {
+          Created drawnObject = CreateObject(entry.Identifier());
+          if (auto* drawn = as<LabelInterface>(drawnObject.object)) {
+            const std::string printer = DrawnPrinter(carrier == "any" ? "Any" : carrier);
+            fs::create_directories(root / "spool" / SafeFileName(printer));
+            std::ofstream(root / "spool" / SafeFileName(printer) / "printer.ini") << "dpi=300\n";
+            const LabelRun labelRun =
+                PrintLabels(*drawn, OverrideSystem(system, "PrinterLanguage", Var("WinPCL")), printer,
+                            {conNotes.front()->Packs()->Item(1)}, std::nullopt);
+            for (const auto& [pack, printed] : labelRun.labels)
+              run["labels"].push_back(
+                  {{"pack", pack}, {"printer", printer}, {"printed", printed}, {"drawn", true}});
+          }
         }
       } else if (auto* consignment = as<ConsignmentInterface>(created.object)) {
         run["consignments"] = json::array();

@@ -73,11 +73,16 @@ std::set<std::string> ReadGs1Barcodes(const std::string& png) {
         // RGB24 (or ARGB32): the green byte of each little-endian pixel stands for grey.
         lum[static_cast<std::size_t>(y * width + x)] = data[y * stride + x * 4 + 1];
       }
-    const ZXing::ImageView view(lum.data(), width, height, ZXing::ImageFormat::Lum);
-    for (const auto& result : ZXing::ReadBarcodes(
-             view, ZXing::DecodeHints().setFormats(ZXing::BarcodeFormat::Code128).setTryRotate(false)))
+    // Band by band down the page, so that each look sees one row of symbols.
+    constexpr int kBand = 60;
+    for (int top = 0; top + kBand <= height; top += kBand / 2) {
+      const ZXing::ImageView band(lum.data() + static_cast<std::ptrdiff_t>(top) * width, width,
+                                  kBand, ZXing::ImageFormat::Lum);
+      const auto result = ZXing::ReadBarcode(
+          band, ZXing::DecodeHints().setFormats(ZXing::BarcodeFormat::Code128).setTryRotate(false));
       if (result.isValid() && result.symbologyIdentifier() == "]C1")
         found.insert(HumanReadable(result.text()));
+    }
   }
   cairo_surface_destroy(image);
   return found;

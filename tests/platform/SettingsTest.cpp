@@ -4,6 +4,7 @@
 
 #include <cstdlib>
 #include <filesystem>
+#include <fstream>
 
 #include "platform/FileSystem.h"
 
@@ -64,6 +65,46 @@ TEST_F(SettingsTest, AChangeByAnotherWriterIsReadAtOnce) {
   EXPECT_EQ(GetSetting("Merivane", "Settings", "clsStarTrackGenericSCM", "x"), "Fals");
   fs::remove(path);
   EXPECT_EQ(GetSetting("Merivane", "Settings", "clsStarTrackGenericSCM", "x"), "x");
+}
+
+// Each change made behind the reader's back is seen by the very next read.
+TEST_F(SettingsTest, EveryKindOfChangeIsReadAtOnce) {
+  const auto get = [] { return GetSetting("Merivane", "Settings", "A", "none"); };
+  const fs::path folder = dir / "Merivane";
+  const fs::path file = folder / "settings.ini";
+  // No folder yet, then a folder without the file, then the file created.
+  EXPECT_EQ(get(), "none");
+  fs::create_directories(folder);
+  EXPECT_EQ(get(), "none");
+  ASSERT_TRUE(AppendFile(file.string(), "[Settings]\nA=1\n"));
+  EXPECT_EQ(get(), "1");
+  // Edited in place, and a line added at the end.
+  { std::ofstream(file, std::ios::in | std::ios::out) << "[Settings]\nA=2\n"; }
+  EXPECT_EQ(get(), "2");
+  ASSERT_TRUE(AppendFile(file.string(), "A=3\n"));
+  EXPECT_EQ(get(), "2");  // the first entry counts
+  // Another file of the folder changes: the value stands.
+  ASSERT_TRUE(AppendFile((folder / "other.ini").string(), "[Settings]\nA=9\n"));
+  EXPECT_EQ(get(), "2");
+  // Moved away, then another moved in by rename.
+  fs::rename(file, folder / "old.ini");
+  EXPECT_EQ(get(), "none");
+  ASSERT_TRUE(AppendFile((folder / "new.ini").string(), "[Settings]\nA=4\n"));
+  fs::rename(folder / "new.ini", file);
+  EXPECT_EQ(get(), "4");
+  // The whole folder moved away, and a new one made in its place.
+  fs::rename(folder, dir / "Moved");
+  EXPECT_EQ(get(), "none");
+  fs::create_directories(folder);
+  ASSERT_TRUE(AppendFile(file.string(), "[Settings]\nA=5\n"));
+  EXPECT_EQ(get(), "5");
+  ASSERT_TRUE(AppendFile((dir / "Moved/settings.ini").string(), "A=6\n"));
+  EXPECT_EQ(get(), "5");
+  // The folder deleted, then saved again.
+  fs::remove_all(folder);
+  EXPECT_EQ(get(), "none");
+  ASSERT_TRUE(SaveSetting("Merivane", "Settings", "A", "7"));
+  EXPECT_EQ(get(), "7");
 }
 
 }  // namespace

@@ -38,7 +38,7 @@ void AddMethods(MemoryHost& host, MemoryObject<host::Log>& log) {
     const auto id = static_cast<std::int32_t>(host.logs.size() + 1);
     log.fields["LogId"] = Var(id);
     log.fields["ID"] = Var(id);
-    host.logs.push_back(log.fields);
+    host.logs.emplace_back(log.fields.begin(), log.fields.end());
     return Var();
   };
 }

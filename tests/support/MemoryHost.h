@@ -11,6 +11,8 @@
 #include <map>
 #include <memory>
 #include <string>
+#include <string_view>
+#include <unordered_map>
 #include <utility>
 #include <vector>
 
@@ -21,6 +23,16 @@ namespace quendal::test {
 
 using Fields = std::vector<std::pair<std::string, Var>>;
 using Method = std::function<Var(std::span<const Var>)>;
+
+// Hashes member names, so that a look-up by string_view builds no string.
+struct NameHash {
+  using is_transparent = void;
+  std::size_t operator()(std::string_view name) const noexcept {
+    return std::hash<std::string_view>{}(name);
+  }
+};
+// An object's members by name.
+using Members = std::unordered_map<std::string, Var, NameHash, std::equal_to<>>;
 
 // A host object whose members are a map; methods are callbacks.
 template <class T>
@@ -42,7 +54,7 @@ class MemoryObject : public T {
   }
   using T::Call;
 
-  std::map<std::string, Var, std::less<>> fields;
+  Members fields;
   std::map<std::string, Method, std::less<>> methods;
 
  private:

@@ -22,7 +22,10 @@ class ComponentBase : public virtual Component {
 
   // "cStarTrackGenericSCM": the module name of the error reports.
   const std::string& ModuleName() const { return module_; }
-  Procedure Guard(std::string_view procedureName) const { return Procedure(module_, procedureName); }
+  // procedureName must outlive the procedure (a literal, as it always is).
+  Procedure Guard(std::string_view procedureName) const {
+    return Procedure(Procedure::Lasting{}, module_, procedureName);
+  }
 
   // Writes one entry into the host's log (under its own guard) and keeps
   // its id as the last log id. The entry's level is LogLevel(errorNumber).

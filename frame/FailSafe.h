@@ -60,7 +60,17 @@ Action ReportError(const ErrorDetails& error, std::string_view module, std::stri
 // A step may return bool: false leaves the procedure without an error.
 class Procedure {
  public:
-  Procedure(std::string_view module, std::string_view name) : module_(module), name_(name) {}
+  // Keeps its own copy of the names.
+  Procedure(std::string_view module, std::string_view name)
+      : ownModule_(module), ownName_(name), module_(ownModule_), name_(ownName_) {}
+  // Refers to names that outlive the procedure (a class's module name and a
+  // literal), so that guarding a call costs no copy.
+  struct Lasting {};
+  Procedure(Lasting, std::string_view module, std::string_view name)
+      : module_(module), name_(name) {}
+  // Made in place only: the names may refer into the object itself.
+  Procedure(const Procedure&) = delete;
+  Procedure& operator=(const Procedure&) = delete;
 
   template <class Step>
   bool operator()(Step&& step) {
@@ -92,8 +102,10 @@ class Procedure {
  private:
   Action Fail();  // reports the exception in flight
 
-  std::string module_;
-  std::string name_;
+  std::string ownModule_;
+  std::string ownName_;
+  std::string_view module_;
+  std::string_view name_;
   long line_ = 0;
 };
 

@@ -1,6 +1,8 @@
 #include "frame/VB.h"
 
+#include <algorithm>
 #include <array>
+#include <charconv>
 #include <cctype>
 #include <cmath>
 #include <cstdio>
@@ -47,13 +49,6 @@ constexpr std::array<std::string_view, 12> kMonths = {
 constexpr std::array<std::string_view, 7> kWeekdays = {
     "Sunday", "Monday", "Tuesday", "Wednesday", "Thursday", "Friday", "Saturday"};
 
-std::string TwoDigits(int v) {
-  if (v >= 0 && v < 100) return {static_cast<char>('0' + v / 10), static_cast<char>('0' + v % 10)};
-  char buf[16];
-  std::snprintf(buf, sizeof buf, "%02d", v);
-  return buf;
-}
-
 char Lower(char c) { return static_cast<char>(std::tolower(static_cast<unsigned char>(c))); }
 
 bool IsDateLetter(char c) {
@@ -61,78 +56,91 @@ bool IsDateLetter(char c) {
   return l == 'd' || l == 'm' || l == 'y' || l == 'h' || l == 'n' || l == 's';
 }
 
+void AppendTwoDigits(std::string& out, int v) {
+  if (v >= 0 && v < 100) {
+    out += static_cast<char>('0' + v / 10);
+    out += static_cast<char>('0' + v % 10);
+    return;
+  }
+  char buf[16];
+  std::snprintf(buf, sizeof buf, "%02d", v);
+  out += buf;
+}
+
+// The end of the run of mask characters starting at `i`: a run of one date
+// letter (any case), or of literal text.
+std::size_t RunEnd(std::string_view mask, std::size_t i) {
+  std::size_t j = i;
+  if (IsDateLetter(mask[i])) {
+    const char l = Lower(mask[i]);
+    while (j < mask.size() && Lower(mask[j]) == l) ++j;
+  } else {
+    while (j < mask.size() && !IsDateLetter(mask[j])) ++j;
+  }
+  return j;
+}
+
 std::string FormatDate(const DateTime& d, std::string_view mask) {
   if (mask == "Short Date") mask = "dd/mm/yyyy";
   if (mask == "Long Date") mask = "dddd, d mmmm yyyy";
-  struct Token {
-    char letter;  // lower-case date letter, or 0 for literal text
-    std::size_t count;
-    std::string_view literal;
-  };
-  std::vector<Token> tokens;
-  for (std::size_t i = 0; i < mask.size();) {
-    if (IsDateLetter(mask[i])) {
-      const char l = Lower(mask[i]);
-      std::size_t j = i;
-      while (j < mask.size() && Lower(mask[j]) == l) ++j;
-      tokens.push_back({l, j - i, {}});
-      i = j;
-    } else {
-      std::size_t j = i;
-      while (j < mask.size() && !IsDateLetter(mask[j])) ++j;
-      tokens.push_back({0, 0, mask.substr(i, j - i)});
-      i = j;
-    }
-  }
   std::string out;
+  out.reserve(mask.size() + 16);
   char previous = 0;  // previous date letter
-  for (std::size_t t = 0; t < tokens.size(); ++t) {
-    const Token& tok = tokens[t];
-    if (!tok.letter) {
-      out += tok.literal;
+  for (std::size_t i = 0; i < mask.size();) {
+    const std::size_t end = RunEnd(mask, i);
+    if (!IsDateLetter(mask[i])) {
+      out += mask.substr(i, end - i);
+      i = end;
       continue;
     }
-    char next = 0;
-    for (std::size_t u = t + 1; u < tokens.size(); ++u)
-      if (tokens[u].letter) {
-        next = tokens[u].letter;
+    const char letter = Lower(mask[i]);
+    const std::size_t count = end - i;
+    char next = 0;  // the next date letter
+    for (std::size_t j = end; j < mask.size(); ++j)
+      if (IsDateLetter(mask[j])) {
+        next = Lower(mask[j]);
         break;
       }
-    switch (tok.letter) {
+    switch (letter) {
       case 'd':
-        if (tok.count == 1) out += std::to_string(d.Day());
-        else if (tok.count == 2) out += TwoDigits(d.Day());
-        else if (tok.count == 3) out += kWeekdays[d.Weekday()].substr(0, 3);
+        if (count == 1) out += std::to_string(d.Day());
+        else if (count == 2) AppendTwoDigits(out, d.Day());
+        else if (count == 3) out += kWeekdays[d.Weekday()].substr(0, 3);
         else out += kWeekdays[d.Weekday()];
         break;
       case 'm':
-        if (tok.count <= 2 && (previous == 'h' || next == 's')) {
-          out += tok.count == 1 ? std::to_string(d.Minute()) : TwoDigits(d.Minute());
-        } else if (tok.count == 1) {
+        if (count <= 2 && (previous == 'h' || next == 's')) {
+          if (count == 1) out += std::to_string(d.Minute());
+          else AppendTwoDigits(out, d.Minute());
+        } else if (count == 1) {
           out += std::to_string(d.Month());
-        } else if (tok.count == 2) {
-          out += TwoDigits(d.Month());
-        } else if (tok.count == 3) {
+        } else if (count == 2) {
+          AppendTwoDigits(out, d.Month());
+        } else if (count == 3) {
           out += kMonths[d.Month() - 1].substr(0, 3);
         } else {
           out += kMonths[d.Month() - 1];
         }
         break;
       case 'y':
-        if (tok.count <= 2) out += TwoDigits(d.Year() % 100);
+        if (count <= 2) AppendTwoDigits(out, d.Year() % 100);
         else out += std::to_string(d.Year());
         break;
       case 'h':
-        out += tok.count == 1 ? std::to_string(d.Hour()) : TwoDigits(d.Hour());
+        if (count == 1) out += std::to_string(d.Hour());
+        else AppendTwoDigits(out, d.Hour());
         break;
       case 'n':
-        out += tok.count == 1 ? std::to_string(d.Minute()) : TwoDigits(d.Minute());
+        if (count == 1) out += std::to_string(d.Minute());
+        else AppendTwoDigits(out, d.Minute());
         break;
       case 's':
-        out += tok.count == 1 ? std::to_string(d.Second()) : TwoDigits(d.Second());
+        if (count == 1) out += std::to_string(d.Second());
+        else AppendTwoDigits(out, d.Second());
         break;
     }
-    previous = tok.letter;
+    previous = letter;
+    i = end;
   }
   return out;
 }
@@ -181,6 +189,21 @@ std::string RoundedDigits(double value, int decimals, std::string& intPart) {
 
 std::string FormatNumber(double value, std::string_view mask) {
   const std::size_t point = mask.find('.');
+  // A whole number under a mask without decimals: its digits, padded with
+  // zeros to the mask's count of "0", as the general path below gives them.
+  if (point == std::string_view::npos && std::fabs(value) < 1e15 && value == std::trunc(value)) {
+    const std::size_t minInt = static_cast<std::size_t>(std::count(mask.begin(), mask.end(), '0'));
+    char digits[24];
+    const auto whole = static_cast<long long>(std::fabs(value));
+    char* end = whole == 0 ? digits : std::to_chars(digits, digits + sizeof digits, whole).ptr;
+    const std::size_t length = static_cast<std::size_t>(end - digits);
+    std::string out;
+    out.reserve(minInt + length + 1);
+    if (value < 0) out += '-';
+    if (length < minInt) out.append(minInt - length, '0');
+    out.append(digits, end);
+    return out;
+  }
   const std::string_view intMask = mask.substr(0, point);
   const std::string_view fracMask =
       point == std::string_view::npos ? std::string_view{} : mask.substr(point + 1);

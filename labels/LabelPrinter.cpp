@@ -40,7 +40,10 @@ float TwoDecimals(double value) { return static_cast<float>(Round(value, 2)); }
 }  // namespace
 
 LabelPrinter::LabelPrinter(std::string_view className, const LabelLayout& layout)
-    : ComponentBase(className), formatNumber_(layout.formatNumber), layout_(layout) {}
+    : ComponentBase(className), formatNumber_(layout.formatNumber), layout_(layout) {
+  const std::string name = ComponentBase::ClassName();
+  switchName_ = name.substr(name.find('.') + 1);
+}
 
 void LabelPrinter::SetUser1(const std::string& value) {
   Guard("Property (Let) User1")([&] { user1_ = Left(value, 30); });
@@ -113,8 +116,7 @@ bool LabelPrinter::PrintLabel(const Ref<host::Pack>& aPack, std::optional<std::i
   // The per-user printing switch of this class, on unless the host turned it off.
   bool printing = false;
   if (!proc([&] {
-        const std::string shortName = ClassName().substr(ClassName().find('.') + 1);
-        printing = TextToFlag(GetSetting("Merivane", "Settings", shortName, "True"));
+        printing = TextToFlag(GetSetting("Merivane", "Settings", switchName_, "True"));
       }))
     return result;
   if (!printing) return result;
@@ -146,8 +148,13 @@ std::string LabelPrinter::VPCLIIBatchCommand() {
   if (!proc([&] { batchMode = system_->PrinterBatchMode().Text(); })) return result;
   proc([&] {
     vpcl::Batch batch(formatNumber_, copies_, batchMode);
-    for (const BatchField& field : layout_.batch)
-      if (!field.sent || field.sent(values_)) batch.Field(field.number, field.data(values_));
+    for (const BatchField& field : layout_.batch) {
+      if (field.sent && !field.sent(values_)) continue;
+      if (field.value)
+        batch.Field(field.number, values_.*field.value);
+      else
+        batch.Field(field.number, field.data(values_));
+    }
     result = std::move(batch).Finish();
   });
   return result;

@@ -64,12 +64,22 @@ struct LabelValues {
   std::string StoreText;
 };
 
-// One field of a batch: its number, its data, and when it is sent (always
-// when `sent` is null).
+// One field of a batch: its number, its data (a value as it stands, or
+// built from the values), and when it is sent (always when `sent` is null).
 struct BatchField {
+  using Value = std::string LabelValues::*;
+  using Data = std::string (*)(const LabelValues&);
+  using Sent = bool (*)(const LabelValues&);
+
+  constexpr BatchField(int number, Value value, Sent sent = nullptr)
+      : number(number), value(value), sent(sent) {}
+  constexpr BatchField(int number, Data data, Sent sent = nullptr)
+      : number(number), data(data), sent(sent) {}
+
   int number;
-  std::string (*data)(const LabelValues&);
-  bool (*sent)(const LabelValues&) = nullptr;
+  Value value = nullptr;
+  Data data = nullptr;
+  Sent sent = nullptr;
 };
 
 // What makes one label class's output its own.
@@ -154,6 +164,8 @@ class LabelPrinter : public virtual LabelInterface, public ComponentBase {
   std::int16_t copies_ = 0;
   std::string printerName_;
   std::string formatNumber_;
+  // The class's printing switch in the settings: its name without the project.
+  std::string switchName_;
   std::string user1_;
   std::string user2_;
   std::string storeZoneDept_;

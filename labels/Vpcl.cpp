@@ -2,6 +2,8 @@
 
 #include <array>
 #include <charconv>
+#include <cstdint>
+#include <cstring>
 
 namespace quendal::vpcl {
 
@@ -95,9 +97,28 @@ constexpr auto kTreat = [] {
 
 }  // namespace
 
+// True when none of the 8 bytes at `p` needs treatment: no control
+// character, no DEL and none of " | { }. Most field data is plain, so it
+// is checked a word at a time.
+bool PlainWord(const char* p) {
+  std::uint64_t x;
+  std::memcpy(&x, p, sizeof x);
+  constexpr std::uint64_t kOnes = 0x0101010101010101ULL;
+  constexpr std::uint64_t kHigh = 0x8080808080808080ULL;
+  // A byte of x equal to b becomes 0 in x ^ (b * kOnes); a zero byte, or a
+  // byte below 0x20 in x itself, sets its high bit in the tests below.
+  const auto zeroByte = [](std::uint64_t v) { return (v - kOnes) & ~v & kHigh; };
+  const std::uint64_t below20 = (x - 0x20 * kOnes) & ~x & kHigh;
+  return (below20 | zeroByte(x ^ ('"' * kOnes)) | zeroByte(x ^ ('|' * kOnes)) |
+          zeroByte(x ^ ('{' * kOnes)) | zeroByte(x ^ ('}' * kOnes)) |
+          zeroByte(x ^ (0x7F * kOnes))) == 0;
+}
+
 void AppendFieldData(std::string& out, std::string_view text) {
   std::size_t run = 0;  // start of the characters kept as they are
-  for (std::size_t i = 0; i < text.size(); ++i) {
+  std::size_t i = 0;
+  while (i + 8 <= text.size() && PlainWord(text.data() + i)) i += 8;
+  for (; i < text.size(); ++i) {
     const Treat treat = kTreat[static_cast<unsigned char>(text[i])];
     if (treat == Treat::Keep) continue;
     out.append(text.data() + run, i - run);

@@ -2,6 +2,8 @@
 
 #include <algorithm>
 #include <chrono>
+#include <cstdint>
+#include <cstring>
 #include <functional>
 #include <thread>
 
@@ -36,6 +38,15 @@ bool SamePackId(const Var& a, const Var& b) {
 }
 
 float TwoDecimals(double value) { return static_cast<float>(Round(value, 2)); }
+
+// A host object several steps of one label read: the first step that needs
+// it reads it from the pack, later ones reuse it. Nothing is not kept, so a
+// step retried after the host set the member reads it again.
+template <class T, class Read>
+T& Kept(Ref<T>& kept, Read read) {
+  if (!kept) kept = read();
+  return *kept;
+}
 
 }  // namespace
 
@@ -264,8 +275,14 @@ void LabelPrinter::AbandonChannel() {
 void LabelPrinter::WriteChannel(std::string_view text) {
   if (handle_ == 0) return;
   // Plain ASCII is the same in the code page: written as it is.
-  const bool ascii = std::all_of(text.begin(), text.end(),
-                                 [](char c) { return static_cast<unsigned char>(c) < 0x80; });
+  bool ascii = true;
+  std::size_t i = 0;
+  for (; ascii && i + 8 <= text.size(); i += 8) {
+    std::uint64_t word;
+    std::memcpy(&word, text.data() + i, sizeof word);
+    ascii = (word & 0x8080808080808080ULL) == 0;
+  }
+  for (; ascii && i < text.size(); ++i) ascii = static_cast<unsigned char>(text[i]) < 0x80;
   if (ascii)
     CurrentSpooler().Write(handle_, text);
   else
@@ -317,12 +334,28 @@ bool LabelPrinter::FillValues(Procedure& proc) {
   bool carrierIdNull = false;
   bool noAsn = false;
   std::string serviceLevel;
+  Ref<host::Carrier> carrier;
+  Ref<host::Vendor> vendor;
+  Ref<host::ConNote> conNote;
+  Ref<host::Despatch> despatch;
+  const auto Carrier = [&]() -> host::Carrier& {
+    return Kept(carrier, [&] { return pack_->Carrier(); });
+  };
+  const auto Vendor = [&]() -> host::Vendor& {
+    return Kept(vendor, [&] { return pack_->Vendor(); });
+  };
+  const auto ConNote = [&]() -> host::ConNote& {
+    return Kept(conNote, [&] { return pack_->ConNote(); });
+  };
+  const auto Despatch = [&]() -> host::Despatch& {
+    return Kept(despatch, [&] { return pack_->Despatch(); });
+  };
   const bool filled =
-      proc([&] { v.AuthorityToLeave = InStr(pack_->Carrier()->Options().Text(), "#%ATL") > 0; }) &&
-      proc([&] { v.FromName = Left(pack_->Vendor()->Name().Text(), 25); }) &&
-      proc([&] { v.FromLine2 = Left(pack_->Vendor()->AddressLine2().Text(), 25); }) &&
-      proc([&] { v.FromLine3 = Left(pack_->Vendor()->AddressLine3().Text(), 25); }) &&
-      proc([&] { v.FromState = Left(pack_->Vendor()->State().Text(), 3); }) &&
+      proc([&] { v.AuthorityToLeave = InStr(Carrier().Options().Text(), "#%ATL") > 0; }) &&
+      proc([&] { v.FromName = Left(Vendor().Name().Text(), 25); }) &&
+      proc([&] { v.FromLine2 = Left(Vendor().AddressLine2().Text(), 25); }) &&
+      proc([&] { v.FromLine3 = Left(Vendor().AddressLine3().Text(), 25); }) &&
+      proc([&] { v.FromState = Left(Vendor().State().Text(), 3); }) &&
       proc([&] {
         const Var id = pack_->CarrierId();
         carrierIdNull = id.IsNull();
@@ -330,19 +363,19 @@ bool LabelPrinter::FillValues(Procedure& proc) {
       }) &&
       proc([&] {
         v.CarrierName = Left(carrierIdNull ? pack_->Receiver()->Carrier()->Name().Text()
-                                           : pack_->Carrier()->Name().Text(),
+                                           : Carrier().Name().Text(),
                              20);
       }) &&
       // Without an advance shipping notice there is no consignment to print.
       proc([&] { noAsn = pack_->ASNId().IsNull(); }) &&
       proc([&] {
-        if (!noAsn) v.ConNoteNo = Left(pack_->ConNote()->ConNoteNo().Text(), 13);
+        if (!noAsn) v.ConNoteNo = Left(ConNote().ConNoteNo().Text(), 13);
       }) &&
       proc([&] {
-        if (!noAsn) v.ServiceLine = "SERVICE:" + pack_->ConNote()->Service().Text();
+        if (!noAsn) v.ServiceLine = "SERVICE:" + ConNote().Service().Text();
       }) &&
       proc([&] {
-        if (!noAsn) serviceLevel = pack_->ConNote()->ServiceLevel().Text();
+        if (!noAsn) serviceLevel = ConNote().ServiceLevel().Text();
       }) &&
       ReadDeliveryAddress(proc) &&
       proc([&] { v.ToSuburbUpper = UCase(v.ToSuburb); }) &&
@@ -354,7 +387,7 @@ bool LabelPrinter::FillValues(Procedure& proc) {
         v.StoreZoneDept = storeZoneDept_;
       }) &&
       proc([&] { v.SSCC = Right(pack_->SSCC().Text(), 18); }) &&
-      proc([&] { v.OrderLine = "PO " + Left(pack_->Despatch()->DespatchNo().Text(), 22); }) &&
+      proc([&] { v.OrderLine = "PO " + Left(Despatch().DespatchNo().Text(), 22); }) &&
       proc([&] {
         const std::string salesOrder = pack_->SalesOrderNo().Text();
         v.SalesOrderLine = Trim(salesOrder).empty() ? std::string() : "SO " + salesOrder;
@@ -362,10 +395,10 @@ bool LabelPrinter::FillValues(Procedure& proc) {
       // A pallet gets a label on each side and a spare.
       proc([&] { copies_ = InStr(pack_->Carton()->Code().Text(), "PLT") > 0 ? 5 : 1; }) &&
       proc([&] {
-        v.NotBeforeLine = "Not Before  " + Format(pack_->Despatch()->NotBefore(), "dd/mm/yy");
+        v.NotBeforeLine = "Not Before  " + Format(Despatch().NotBefore(), "dd/mm/yy");
       }) &&
       proc([&] {
-        v.NotAfterLine = "Not After   " + Format(pack_->Despatch()->NotAfter(), "dd/mm/yy");
+        v.NotAfterLine = "Not After   " + Format(Despatch().NotAfter(), "dd/mm/yy");
       }) &&
       proc([&] { v.PackedLine = "Date Packed " + Format(Var(Today()), "dd/mm/yy"); });
   if (!filled) return false;
@@ -373,7 +406,7 @@ bool LabelPrinter::FillValues(Procedure& proc) {
   return proc([&] {
            // The pack's place among its consignment's packs; the last place
            // when it is not among them.
-           const Ref<host::PackList> packs = pack_->ConNote()->Packs();
+           const Ref<host::PackList> packs = ConNote().Packs();
            const Var id = pack_->PackId();
            const std::int32_t count = packs->Count();
            std::int32_t ordinal = count;

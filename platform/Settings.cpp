@@ -183,7 +183,8 @@ class SettingsCache {
 
   void MarkStale(const struct inotify_event& event) {
     const bool everything = (event.mask & IN_Q_OVERFLOW) != 0;
-    const bool folder = (event.mask & (IN_DELETE_SELF | IN_MOVE_SELF | IN_IGNORED | IN_UNMOUNT)) != 0;
+    const bool folder =
+        (event.mask & (IN_DELETE_SELF | IN_MOVE_SELF | IN_IGNORED | IN_UNMOUNT)) != 0;
     const std::string_view name = event.len ? std::string_view(event.name) : std::string_view();
     for (auto& [path, entry] : entries_) {
       if (!everything && entry.watch != event.wd) continue;

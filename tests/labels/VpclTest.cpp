@@ -40,7 +40,8 @@ TEST(VpclTest, FieldDataTreatsEveryPositionOfLongTexts) {
       EXPECT_EQ(FieldData(text), expected) << at << " " << static_cast<int>(c);
     }
   }
-  EXPECT_EQ(FieldData("Caf\xC3\xA9 ~ ! ` \x80\xFE\x7E\x20 Z"), "Caf\xC3\xA9 ~ ! ` \x80\xFE\x7E\x20 Z");
+  const std::string kept = "Caf\xC3\xA9 ~ ! ` \x80\xFE\x7E\x20 Z";
+  EXPECT_EQ(FieldData(kept), kept);
   std::string batch = std::move(Batch("430", 1, "1").Field(8, "CHADSTONE VIC \"3148\"")).Finish();
   EXPECT_EQ(batch, "{B,430,N,1|E,1,0,1,1,0,1|8,\"CHADSTONE VIC 3148\"|}");
 }

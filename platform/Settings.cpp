@@ -122,8 +122,8 @@ bool WatchesAreReliable(const std::string& folder) {
 // naming the file (saved, replaced by rename, created, deleted, edited) or
 // the folder itself (deleted, moved) marks the parsed copy stale. The kernel
 // queues the event before the writer's call returns, so the next read after
-// any change sees it. Where no watch can be set (no folder yet, a network
-// share), the file is stamped on every read instead.
+// any change sees it. Where a watch can't tell (a network share, a settings
+// file that is a symbolic link), the file is stamped on every read instead.
 class SettingsCache {
  public:
   std::string Value(const std::string& path, std::string_view section, std::string_view key,
@@ -172,6 +172,7 @@ class SettingsCache {
     alignas(struct inotify_event) char buffer[4096];
     for (;;) {
       const ssize_t n = ::read(fd_, buffer, sizeof buffer);
+      if (n < 0 && errno == EINTR) continue;
       if (n <= 0) return;  // EAGAIN: nothing more queued
       for (ssize_t at = 0; at < n;) {
         const auto* event = reinterpret_cast<const struct inotify_event*>(buffer + at);
@@ -205,6 +206,11 @@ class SettingsCache {
     ::inotify_rm_watch(fd_, watch);
   }
 
+  static bool IsLink(const std::string& path) {
+    struct stat st {};
+    return ::lstat(path.c_str(), &st) == 0 && S_ISLNK(st.st_mode);
+  }
+
   static std::string_view FileName(std::string_view path) {
     const std::size_t slash = path.rfind('/');
     return slash == std::string_view::npos ? path : path.substr(slash + 1);
@@ -217,6 +223,11 @@ class SettingsCache {
       if (result.noFolder) return false;  // nothing to read yet; watched once the folder exists
       entry.watch = result.watch;
       entry.stampOnly = result.watch < 0;
+    }
+    if (entry.watch >= 0 && IsLink(path)) {
+      // The folder's events don't tell of changes to the file linked to.
+      DropWatch(entry);
+      entry.stampOnly = true;
     }
     if (entry.watch >= 0) {
       // Watched before reading: a change from here on leaves an event.

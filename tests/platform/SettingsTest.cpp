@@ -105,6 +105,12 @@ TEST_F(SettingsTest, EveryKindOfChangeIsReadAtOnce) {
   EXPECT_EQ(get(), "none");
   ASSERT_TRUE(SaveSetting("Merivane", "Settings", "A", "7"));
   EXPECT_EQ(get(), "7");
+  // Replaced by a link to a file elsewhere, which is then edited.
+  fs::remove(file);
+  fs::create_symlink(dir / "Moved/settings.ini", file);
+  EXPECT_EQ(get(), "4");
+  { std::ofstream(dir / "Moved/settings.ini", std::ios::in | std::ios::out) << "[Settings]\nA=8"; }
+  EXPECT_EQ(get(), "8");
 }
 
 }  // namespace

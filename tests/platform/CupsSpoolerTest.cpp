@@ -94,6 +94,17 @@ TEST_F(CupsSpoolerTest, LabelsReachTheQueueByteForByte) {
   ASSERT_NE(batch.find("\"Caf\xE9 Supplies\""), std::string::npos);
   EXPECT_EQ(Delivered(batch.size()), batch);
   EXPECT_TRUE(host.logs.empty());
+
+  // The same label drawn for an ordinary printer reaches the queue as a PDF page.
+  fs::remove(file);
+  host.system->fields["PrinterLanguage"] = "WinPCL";
+  clsStarTrackGenericSCM drawn;
+  ASSERT_TRUE(drawn.Init(host.system, queue));
+  ASSERT_TRUE(drawn.PrintLabel(pack));
+  const std::string pdf = Delivered(1000);
+  EXPECT_TRUE(pdf.starts_with("%PDF-")) << pdf.substr(0, 40);
+  EXPECT_NE(pdf.find("%%EOF"), std::string::npos);
+  EXPECT_TRUE(host.logs.empty());
   SetNow(std::nullopt);
 
   long error = 0;

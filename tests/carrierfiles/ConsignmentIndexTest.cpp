@@ -3,6 +3,7 @@
 #include <gtest/gtest.h>
 
 #include <filesystem>
+#include "tests/support/TempFolder.h"
 
 namespace quendal {
 namespace {
@@ -18,14 +19,9 @@ std::string Key(std::string_view number) {
 class ConsignmentIndexTest : public ::testing::Test {
  protected:
   void SetUp() override {
-    dir = fs::temp_directory_path() /
-          ("quendal-index-" + std::to_string(::getpid()) + "-" +
-           ::testing::UnitTest::GetInstance()->current_test_info()->name());
-    fs::remove_all(dir);
     fs::create_directories(dir);
     path = (dir / "DAY.CLN").string();
   }
-  void TearDown() override { fs::remove_all(dir); }
 
   // Appends as the class does: open, one write, close; the index follows.
   void OurAppend(const std::string& bytes) {
@@ -36,7 +32,9 @@ class ConsignmentIndexTest : public ::testing::Test {
     index.Appended(path, bytes, before, file.Stamp());
   }
 
-  fs::path dir;
+  test::TempFolder temp;
+
+  fs::path dir{temp.path()};
   std::string path;
   ConsignmentIndex index{"10", 20};
 };

@@ -10,6 +10,7 @@
 #include "carrierfiles/FixedRecord.h"
 #include "platform/Clock.h"
 #include "tests/support/MemoryHost.h"
+#include "tests/support/TempFolder.h"
 
 namespace quendal {
 namespace {
@@ -60,21 +61,17 @@ class ConsignmentWriterTest : public ::testing::Test {
  protected:
   void SetUp() override {
     SetNow(DateTime::FromParts(2024, 3, 14, 9, 0, 0));
-    dir = fs::temp_directory_path() /
-          ("quendal-cw-" + std::to_string(::getpid()) + "-" +
-           ::testing::UnitTest::GetInstance()->current_test_info()->name());
-    fs::remove_all(dir);
     fs::create_directories(dir);
   }
   void TearDown() override {
     SetNow(std::nullopt);
-    fs::remove_all(dir);
   }
   std::string Path(const std::string& name) const { return (dir / name).string(); }
 
   MemoryHost host;
   test::PromptScope prompt{std::make_shared<test::ScriptedPrompt>()};
-  fs::path dir;
+  test::TempFolder temp;
+  fs::path dir{temp.path()};
   Probe probe;
 };
 

@@ -9,6 +9,7 @@
 #include "platform/DirectorySpooler.h"
 #include "platform/FileSystem.h"
 #include "tests/support/MemoryHost.h"
+#include "tests/support/TempFolder.h"
 
 namespace quendal {
 namespace {
@@ -68,10 +69,6 @@ class StarTrackDAclnTest : public ::testing::Test {
  protected:
   void SetUp() override {
     SetNow(DateTime::FromParts(2024, 3, 14, 9, 0, 0));
-    root = fs::temp_directory_path() /
-           ("quendal-cln-" + std::to_string(::getpid()) + "-" +
-            ::testing::UnitTest::GetInstance()->current_test_info()->name());
-    fs::remove_all(root);
     fs::create_directories(root / "carrier");
     fs::create_directories(root / "spool" / "Office Laser");
     folder = (root / "carrier").string() + "/";
@@ -106,7 +103,6 @@ class StarTrackDAclnTest : public ::testing::Test {
   void TearDown() override {
     SetSpooler(previousSpooler);
     SetNow(std::nullopt);
-    fs::remove_all(root);
   }
 
   std::shared_ptr<MemoryObject<host::Pack>> Pack(std::string_view sscc,
@@ -152,7 +148,8 @@ class StarTrackDAclnTest : public ::testing::Test {
   std::string File(const std::string& name) const { return ReadFile(folder + name).value_or("<none>"); }
 
   MemoryHost host;
-  fs::path root;
+  test::TempFolder temp;
+  fs::path root{temp.path()};
   std::string folder;
   std::shared_ptr<Spooler> previousSpooler;
   std::shared_ptr<MemoryObject<host::Carrier>> carrier;

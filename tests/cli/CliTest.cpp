@@ -12,7 +12,7 @@
 #include <nlohmann/json.hpp>
 
 #include "frame/Catalogue.h"
-#include "tests/mvserver/TempFolder.h"
+#include "tests/support/TempFolder.h"
 
 namespace quendal {
 namespace {

@@ -14,6 +14,7 @@
 #include "platform/DirectorySpooler.h"
 #include "platform/FileSystem.h"
 #include "tests/support/MemoryHost.h"
+#include "tests/support/TempFolder.h"
 
 namespace quendal {
 namespace {
@@ -91,8 +92,6 @@ std::set<std::string> ReadGs1Barcodes(const std::string& png) {
 class DrawnLabelTest : public ::testing::TestWithParam<int> {
  protected:
   void SetUp() override {
-    root = fs::temp_directory_path() / ("quendal-drawn-" + std::to_string(::getpid()));
-    fs::remove_all(root);
     fs::create_directories(root / "Office Laser");
     AppendFile((root / "Office Laser/printer.ini").string(),
                "dpi=" + std::to_string(GetParam()) + "\n");
@@ -103,10 +102,10 @@ class DrawnLabelTest : public ::testing::TestWithParam<int> {
   void TearDown() override {
     SetSpooler(previous);
     SetNow(std::nullopt);
-    fs::remove_all(root);
   }
 
-  fs::path root;
+  test::TempFolder temp;
+  fs::path root{temp.path()};
   std::shared_ptr<Spooler> previous;
   MemoryHost host;
 };

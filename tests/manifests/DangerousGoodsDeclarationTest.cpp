@@ -10,6 +10,7 @@
 #include "platform/DirectorySpooler.h"
 #include "tests/support/MemoryHost.h"
 #include "tests/support/PdfText.h"
+#include "tests/support/TempFolder.h"
 
 namespace quendal {
 namespace {
@@ -24,10 +25,6 @@ class DangerousGoodsDeclarationTest : public ::testing::Test {
  protected:
   void SetUp() override {
     SetNow(DateTime::FromParts(2024, 3, 14, 9, 0, 0));
-    root = fs::temp_directory_path() /
-           ("quendal-dg-" + std::to_string(::getpid()) + "-" +
-            ::testing::UnitTest::GetInstance()->current_test_info()->name());
-    fs::remove_all(root);
     fs::create_directories(root / "Office Laser");
     previous = SetSpooler(std::make_shared<DirectorySpooler>(root.string()));
     host.system->fields["DocumentPrinter"] = "Office Laser";
@@ -57,7 +54,6 @@ class DangerousGoodsDeclarationTest : public ::testing::Test {
   void TearDown() override {
     SetSpooler(previous);
     SetNow(std::nullopt);
-    fs::remove_all(root);
   }
 
   using Line = std::pair<std::shared_ptr<MemoryObject<host::Product>>, int>;
@@ -92,7 +88,8 @@ class DangerousGoodsDeclarationTest : public ::testing::Test {
   }
 
   MemoryHost host;
-  fs::path root;
+  test::TempFolder temp;
+  fs::path root{temp.path()};
   std::shared_ptr<Spooler> previous;
   std::shared_ptr<MemoryObject<host::Product>> aerosol, perfume, mystery, soap;
   std::shared_ptr<MemoryObject<host::Order>> order;

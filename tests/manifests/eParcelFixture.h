@@ -17,6 +17,7 @@
 #include "platform/Clock.h"
 #include "platform/FileSystem.h"
 #include "tests/support/MemoryHost.h"
+#include "tests/support/TempFolder.h"
 
 namespace quendal::test {
 
@@ -24,10 +25,6 @@ class eParcelFixture : public ::testing::Test {
  protected:
   void SetUp() override {
     SetNow(DateTime::FromParts(2024, 3, 14, 16, 30, 0));
-    dir = std::filesystem::temp_directory_path() /
-          ("quendal-eparcel-" + std::to_string(::getpid()) + "-" +
-           ::testing::UnitTest::GetInstance()->current_test_info()->name());
-    std::filesystem::remove_all(dir);
     std::filesystem::create_directories(dir);
     folder = dir.string() + "/";
     vendor = host.Make<host::Vendor>({{"VendorId", 1},
@@ -54,7 +51,6 @@ class eParcelFixture : public ::testing::Test {
   }
   void TearDown() override {
     SetNow(std::nullopt);
-    std::filesystem::remove_all(dir);
   }
 
   // The clock on the real date (the date new files are created on), at a fixed time.
@@ -131,7 +127,8 @@ class eParcelFixture : public ::testing::Test {
   }
 
   MemoryHost host;
-  std::filesystem::path dir;
+  test::TempFolder temp;
+  std::filesystem::path dir{temp.path()};
   std::string folder;
   std::shared_ptr<MemoryObject<host::Vendor>> vendor;
   std::shared_ptr<MemoryObject<host::Carrier>> carrier;

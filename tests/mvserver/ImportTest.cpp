@@ -4,7 +4,7 @@
 #include <nlohmann/json.hpp>
 
 #include "mvserver/SqliteHost.h"
-#include "tests/mvserver/TempFolder.h"
+#include "tests/support/TempFolder.h"
 
 namespace quendal::mvserver {
 namespace {

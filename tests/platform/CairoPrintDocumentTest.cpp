@@ -9,6 +9,7 @@
 #include "platform/FileSystem.h"
 #include "platform/MemorySpooler.h"
 #include "tests/support/PdfText.h"
+#include "tests/support/TempFolder.h"
 
 namespace quendal {
 namespace {
@@ -19,16 +20,11 @@ using ::testing::HasSubstr;
 class CairoPrintDocumentTest : public ::testing::Test {
  protected:
   void SetUp() override {
-    root = fs::temp_directory_path() /
-           ("quendal-doc-" + std::to_string(::getpid()) + "-" +
-            ::testing::UnitTest::GetInstance()->current_test_info()->name());
-    fs::remove_all(root);
     fs::create_directories(root / "spool" / "Office Laser");
     previous = SetSpooler(std::make_shared<DirectorySpooler>((root / "spool").string()));
   }
   void TearDown() override {
     SetSpooler(previous);
-    fs::remove_all(root);
   }
   std::vector<fs::path> Jobs() const {
     std::vector<fs::path> jobs;
@@ -37,7 +33,9 @@ class CairoPrintDocumentTest : public ::testing::Test {
     return jobs;
   }
 
-  fs::path root;
+  test::TempFolder temp;
+
+  fs::path root{temp.path()};
   std::shared_ptr<Spooler> previous;
 };
 

@@ -6,6 +6,7 @@
 
 #include "frame/Error.h"
 #include "platform/FileSystem.h"
+#include "tests/support/TempFolder.h"
 
 namespace quendal {
 namespace {
@@ -15,12 +16,10 @@ namespace fs = std::filesystem;
 class DirectorySpoolerTest : public ::testing::Test {
  protected:
   void SetUp() override {
-    root = fs::temp_directory_path() / ("quendal-spool-" + std::to_string(::getpid()));
-    fs::remove_all(root);
     fs::create_directories(root / "Dock Zebra");
   }
-  void TearDown() override { fs::remove_all(root); }
-  fs::path root;
+  test::TempFolder temp;
+  fs::path root{temp.path()};
 };
 
 TEST_F(DirectorySpoolerTest, OneFilePerJobWithTheBytesAsSent) {

@@ -5,6 +5,7 @@
 #include <filesystem>
 
 #include "platform/Clock.h"
+#include "tests/support/TempFolder.h"
 
 namespace quendal {
 namespace {
@@ -14,15 +15,11 @@ namespace fs = std::filesystem;
 class FileSystemTest : public ::testing::Test {
  protected:
   void SetUp() override {
-    dir = fs::temp_directory_path() /
-          ("quendal-fs-" + std::to_string(::testing::UnitTest::GetInstance()->random_seed()) + "-" +
-           ::testing::UnitTest::GetInstance()->current_test_info()->name());
-    fs::remove_all(dir);
     fs::create_directories(dir);
   }
-  void TearDown() override { fs::remove_all(dir); }
   std::string Path(const std::string& name) const { return (dir / name).string(); }
-  fs::path dir;
+  test::TempFolder temp;
+  fs::path dir{temp.path()};
 };
 
 TEST_F(FileSystemTest, ListsFilesByNameWithCreationDates) {

@@ -1,4 +1,4 @@
-#include "tests/mvserver/TempFolder.h"
+#include "tests/support/TempFolder.h"
 
 #include <unistd.h>
 

@@ -25,11 +25,6 @@ int Pixels(double units, float twipsPerPixel) {
 
 }  // namespace
 
-float TwipsPerPixel(double dotsPerInch) {
-  if (!(dotsPerInch > 0)) return 1.0f;
-  return static_cast<float>(std::round(1440.0 / dotsPerInch * 100.0) / 100.0);
-}
-
 void PrintText(Canvas& canvas, float twipsPerPixelX, float twipsPerPixelY, std::string_view text,
                int x, int y, int width, int height, int /*charset*/, int weight,
                std::string_view face, Colour textColour, Colour backColour) {

@@ -29,7 +29,4 @@ void EAN128Barcode(Canvas& canvas, float twipsPerPixelX, float twipsPerPixelY,
 void DrawLabel(Canvas& canvas, float twipsPerPixelX, float twipsPerPixelY,
                const LabelDrawing& drawing);
 
-// A device's twips per pixel as the installed-printer list reports it: 1440 / dpi, two decimals.
-float TwipsPerPixel(double dotsPerInch);
-
 }  // namespace quendal

@@ -12,12 +12,6 @@ namespace {
 
 using Primitive = RecordingCanvas::Primitive;
 
-TEST(WinPrintDrawTest, TwipsPerPixelAsTheDeviceListReportsIt) {
-  EXPECT_FLOAT_EQ(TwipsPerPixel(300), 4.8f);
-  EXPECT_FLOAT_EQ(TwipsPerPixel(203), 7.09f);
-  EXPECT_FLOAT_EQ(TwipsPerPixel(0), 1.0f);
-}
-
 TEST(WinPrintDrawTest, BarcodeModulesAreStrokesOneModuleWide) {
   RecordingCanvas canvas;
   const std::string data = "~20100093123450000000012";

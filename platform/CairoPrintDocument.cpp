@@ -112,10 +112,11 @@ struct CairoPrintDocument::Impl {
     y = kMarginTop;
   }
 
-  // Starts a new page when `height` does not fit below the current position
-  // (unless the page is still empty).
+  // Whether `height` fits below the current position; anything fits on an empty page.
+  bool Fits(double height) const { return y + height <= Bottom() || y <= kMarginTop; }
+  // Starts a new page when `height` does not fit below the current position.
   void Room(double height) {
-    if (y + height > Bottom() && y > kMarginTop) NewPage();
+    if (!Fits(height)) NewPage();
   }
 
   PangoLayout* Layout(const std::string& text, const std::string& font, double points,
@@ -166,9 +167,19 @@ struct CairoPrintDocument::Impl {
     pango_layout_iter_free(iter);
   }
 
-  void Row(const std::vector<TableColumn>& columns, const TableRow& cells,
-           std::optional<Colour> shade, bool header) {
-    std::vector<PangoLayout*> layouts;
+  // A table row laid out for the columns: one layout per cell and the row's height.
+  struct RowLayout {
+    std::vector<PangoLayout*> cells;
+    double height = 0;
+    RowLayout() = default;
+    RowLayout(const RowLayout&) = delete;
+    RowLayout& operator=(const RowLayout&) = delete;
+    ~RowLayout() {
+      for (PangoLayout* cell : cells) g_object_unref(cell);
+    }
+  };
+
+  void Measure(const std::vector<TableColumn>& columns, const TableRow& cells, RowLayout& row) {
     double height = 0;
     for (std::size_t i = 0; i < columns.size(); ++i) {
       const std::string text = i < cells.size() ? cells[i] : std::string();
@@ -176,14 +187,18 @@ struct CairoPrintDocument::Impl {
           text, "Arial", fontPoints, columns[i].width - 2 * kCellPadding,
           columns[i].align == TableColumn::Align::Centre ? PANGO_ALIGN_CENTER : PANGO_ALIGN_LEFT);
       height = std::max(height, Height(layout));
-      layouts.push_back(layout);
+      row.cells.push_back(layout);
     }
-    height += 2 * kCellPadding;
-    Room(height);
+    row.height = height + 2 * kCellPadding;
+  }
+
+  // Draws a measured row at the current position, which it moves below the row.
+  void Draw(const std::vector<TableColumn>& columns, const RowLayout& row,
+            std::optional<Colour> shade) {
     double x = kMarginLeft;
     for (std::size_t i = 0; i < columns.size(); ++i) {
       const double width = columns[i].width;
-      cairo_rectangle(cr, x, y, width, height);
+      cairo_rectangle(cr, x, y, width, row.height);
       if (shade) {
         SetColour(cr, *shade);
         cairo_fill_preserve(cr);
@@ -192,12 +207,14 @@ struct CairoPrintDocument::Impl {
       cairo_set_line_width(cr, kLineWidth);
       cairo_stroke(cr);
       cairo_move_to(cr, x + kCellPadding, y + kCellPadding);
-      pango_cairo_show_layout(cr, layouts[i]);
-      g_object_unref(layouts[i]);
+      pango_cairo_show_layout(cr, row.cells[i]);
       x += width;
     }
-    y += height;
+    y += row.height;
+  }
 
+  void HtmlRow(const std::vector<TableColumn>& columns, const TableRow& cells,
+               std::optional<Colour> shade, bool header) {
     html += "<tr>";
     for (std::size_t i = 0; i < columns.size(); ++i) {
       const char* tag = header ? "th" : "td";
@@ -298,8 +315,31 @@ void CairoPrintDocument::AddTable(std::string_view format, const TableRow& heade
   const std::vector<TableColumn> columns = ParseTableFormat(format);
   if (columns.empty()) return;
   d.html += "<table style=\"border-collapse:collapse\" border=\"1\">\n";
-  if (!header.empty()) d.Row(columns, header, headerShade, true);
-  for (const TableRow& row : body) d.Row(columns, row, std::nullopt, false);
+  // The header row stays with the first body row, and stands again at the
+  // top of every page the table runs on to.
+  Impl::RowLayout headerRow;
+  if (!header.empty()) {
+    d.Measure(columns, header, headerRow);
+    d.HtmlRow(columns, header, headerShade, true);
+  }
+  double keep = headerRow.height;
+  if (!body.empty()) {
+    Impl::RowLayout first;
+    d.Measure(columns, body.front(), first);
+    keep += first.height;
+  }
+  d.Room(keep);
+  if (!header.empty()) d.Draw(columns, headerRow, headerShade);
+  for (const TableRow& cells : body) {
+    Impl::RowLayout row;
+    d.Measure(columns, cells, row);
+    if (!d.Fits(row.height)) {
+      d.NewPage();
+      if (!header.empty()) d.Draw(columns, headerRow, headerShade);
+    }
+    d.Draw(columns, row, std::nullopt);
+    d.HtmlRow(columns, cells, std::nullopt, false);
+  }
   d.html += "</table>\n";
 }
 

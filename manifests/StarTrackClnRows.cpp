@@ -33,8 +33,7 @@ void StarTrackClnRows::FillRow(Grid& rows, std::size_t row, const Ref<host::ConN
 void StarTrackClnRows::LogLine(long errorNumber, std::string_view procedure,
                                std::string_view message) {
   WriteLog(errorNumber, procedure, message);
-  written_.push_back(LastLogId());
-  if (errorLog_) *errorLog_ = written_;
+  if (errorLog_) errorLog_->push_back(LastLogId());
 }
 
 std::int32_t StarTrackClnRows::ProcessRow(Procedure& proc, const Ref<host::ConNote>& conNote,

@@ -51,8 +51,8 @@ class StarTrackClnRows : public ConsolidatedManifestRows, private ClnWriter::Own
 
   const StarTrackRowsVariant& variant_;
   ClnWriter cln_;
-  // The ids of every log entry this object wrote; each row hands back the whole list.
-  LogList written_;
+  // The caller's list while a row runs: it keeps what it held and gets each
+  // entry's id as the entry is written, as the despatch class's does.
   LogList* errorLog_ = nullptr;
 };
 

@@ -386,6 +386,9 @@ bool ClnWriter::Write(Procedure& proc, const ClnConsignment& c,
         index_.Appended(path, records, before, file_.Stamp());
       }))
     return false;
+  // The consignment is whole in the file; only now may the caller mark it
+  // done (a manifest run stamps it), so a consignment is never marked for
+  // records that are not there.
   if (written && !written()) return false;
   const bool done = true;
 

@@ -79,11 +79,7 @@ std::int32_t StarTrackClnRows::ProcessRow(Procedure& proc, const Ref<host::ConNo
     return proc([&] { conNote->SetManifestId(manifest_->ManifestId()); });
   });
   if (!written) return result;
-  proc([&] {
-    const double id = conNote->ConNoteId().NumberOr(0);
-    // An id the 32-bit result cannot hold is no id the host could look up.
-    if (id >= INT32_MIN && id <= INT32_MAX) result = static_cast<std::int32_t>(id);
-  });
+  proc([&] { result = ConNoteIdResult(conNote); });
   return result;
 }
 

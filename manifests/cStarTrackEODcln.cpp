@@ -1,18 +1,8 @@
 #include "manifests/cStarTrackEODcln.h"
 
-#include <array>
-
 namespace quendal {
 
 namespace {
-
-constexpr std::array<GridColumn, 5> kColumns = {{
-    {"ConNote No", 0, 1500},
-    {"Partner", 2, 1000},
-    {"Delivery Locn", 0, 2000},
-    {"Order No", 0, 2600},
-    {"Result", 0, 3000},
-}};
 
 // The day's file as the despatch class keeps it; a consignment without a
 // weight says 1, nothing is left without a signature, and every pack
@@ -20,7 +10,7 @@ constexpr std::array<GridColumn, 5> kColumns = {{
 constexpr StarTrackRowsVariant kEndOfDay{
     .className = "clsStarTrackEODcln",
     .manifestRun = false,
-    .columns = kColumns,
+    .columns = kConsignmentColumns,
     .rowColumns = 6,
     .cln =
         {

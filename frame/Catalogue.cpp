@@ -9,6 +9,7 @@ std::unique_ptr<Component> MakeStarTrackGenericSCM();
 std::unique_ptr<Component> MakeeParcelManifestxml();
 std::unique_ptr<Component> MakeeParcelManifestEODxml();
 std::unique_ptr<Component> MakeStarTrackDAcln();
+std::unique_ptr<Component> MakeTNTDAet11();
 
 namespace {
 
@@ -17,7 +18,7 @@ using enum Family;
 constexpr std::array kCatalogue = {
     CatalogueEntry{"clsStarTrackDAcln", Consignment, "StarTrack",
                    "CLN consignment file, dangerous goods declaration", MakeStarTrackDAcln},
-    CatalogueEntry{"clsTNTDAet11", Consignment, "TNT", "ET11 file", nullptr},
+    CatalogueEntry{"clsTNTDAet11", Consignment, "TNT", "ET11 file", MakeTNTDAet11},
     CatalogueEntry{"clsStarTrackCMLSCM", Label, "StarTrack", "CML", nullptr},
     CatalogueEntry{"clsTNTCMLSCM", Label, "TNT", "CML", nullptr},
     CatalogueEntry{"clsStarTrackDJsSCM", Label, "StarTrack", "David Jones", nullptr},

@@ -10,6 +10,7 @@ std::unique_ptr<Component> MakeeParcelManifestxml();
 std::unique_ptr<Component> MakeeParcelManifestEODxml();
 std::unique_ptr<Component> MakeStarTrackDAcln();
 std::unique_ptr<Component> MakeTNTDAet11();
+std::unique_ptr<Component> MakeVicExpressDAcln();
 
 namespace {
 
@@ -29,7 +30,7 @@ constexpr std::array kCatalogue = {
     CatalogueEntry{"clsStarTrackBLSCM", Label, "StarTrack", "BL", nullptr},
     CatalogueEntry{"clsIpecDA1256", Consignment, "Ipec", "1256 file", nullptr},
     CatalogueEntry{"clsVicExpressDAcln", Consignment, "VicExpress", "consignment file (\".CTN\")",
-                   nullptr},
+                   MakeVicExpressDAcln},
     CatalogueEntry{"clsVLODAcsv", Consignment, "VLO", "map-driven CSV file", nullptr},
     CatalogueEntry{"clsMayneCMLSCM", Label, "Mayne", "CML", nullptr},
     CatalogueEntry{"clsMayneGenericSCM", Label, "Mayne", "any retailer", nullptr},

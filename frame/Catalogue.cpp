@@ -11,6 +11,7 @@ std::unique_ptr<Component> MakeeParcelManifestEODxml();
 std::unique_ptr<Component> MakeStarTrackDAcln();
 std::unique_ptr<Component> MakeTNTDAet11();
 std::unique_ptr<Component> MakeVicExpressDAcln();
+std::unique_ptr<Component> MakeAlliedExpressSEDIP();
 
 namespace {
 
@@ -50,7 +51,8 @@ constexpr std::array kCatalogue = {
     CatalogueEntry{"clsTollMYERSCM", Label, "Toll", "Myer", nullptr},
     CatalogueEntry{"clsTNTTransactionDAcsv", Consignment, "TNT", "map-driven CSV transaction file",
                    nullptr},
-    CatalogueEntry{"clsAlliedExpressSEDIP", Consignment, "Allied Express", "SEDIP file", nullptr},
+    CatalogueEntry{"clsAlliedExpressSEDIP", Consignment, "Allied Express", "SEDIP file",
+                   MakeAlliedExpressSEDIP},
     CatalogueEntry{"clsStarTrackRebelSCM", Label, "StarTrack", "Rebel", nullptr},
     CatalogueEntry{"clsIFSAPISCM", Label, "IFS", "any retailer", nullptr},
     CatalogueEntry{"clsIFSDJsSCM", Label, "IFS", "David Jones", nullptr},

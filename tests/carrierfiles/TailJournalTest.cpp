@@ -1,9 +1,8 @@
-#include "carrierfiles/TailJournal.h"
-
 #include <gtest/gtest.h>
 
 #include <filesystem>
 
+#include "carrierfiles/TailJournal.h"
 #include "platform/FileSystem.h"
 #include "tests/support/FileSizeLimit.h"
 #include "tests/support/TempFolder.h"

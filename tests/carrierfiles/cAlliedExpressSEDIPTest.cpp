@@ -1,10 +1,9 @@
-#include "carrierfiles/cAlliedExpressSEDIP.h"
-
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
 #include <filesystem>
 
+#include "carrierfiles/cAlliedExpressSEDIP.h"
 #include "platform/Clock.h"
 #include "platform/FileSystem.h"
 #include "tests/support/MemoryHost.h"
@@ -19,7 +18,8 @@ using test::MemoryObject;
 using ::testing::ElementsAre;
 
 std::string Delivery(std::string_view sscc) {
-  return "|D|15/03/2024|09:00:00||5000|MDS|Rear loading dock|ADELAIDE|SA||||Store Manager|03 9000 1140|" +
+  return "|D|15/03/2024|09:00:00||5000|MDS|Rear loading dock|ADELAIDE|SA||||Store Manager|03 9000 "
+         "1140|" +
          std::string(sscc) + "|1||||||||||||||\r\n";
 }
 
@@ -31,7 +31,8 @@ std::string Transmission(std::string_view records, std::string_view deliveries) 
          std::string(records) +
          "\r\n#SOD\r\n"
          "|H|ALX00012355|ASN0004510|SA|ADL|40|12.5|ROAD||||||Allied Express|ASN0004510||||\r\n"
-         "|P|14/03/2024|10:30:00|3175|Kestrel Apparel Pty Ltd|40 Industry Drive|DANDENONG SOUTH|VIC|||||||"
+         "|P|14/03/2024|10:30:00|3175|Kestrel Apparel Pty Ltd|40 Industry Drive|DANDENONG "
+         "SOUTH|VIC|||||||"
          "Unit 7|\r\n" +
          std::string(deliveries) + "#EOD\r\n#EOT\r\n";
 }
@@ -60,30 +61,35 @@ class AlliedExpressSEDIPTest : public ::testing::Test {
   void TearDown() override { SetNow(std::nullopt); }
 
   void Process(int packs) {
-    auto conNote = host.Make<host::ConNote>({{"ConNoteNo", "ALX00012355"},
-                                             {"ConNoteDate", DateTime::FromParts(2024, 3, 14, 10, 30, 0)},
-                                             {"ScheduledDate", DateTime::FromParts(2024, 3, 15, 9, 0, 0)},
-                                             {"Weight", 0.4 * 100},
-                                             {"Cube", 12.5},
-                                             {"Service", "ROAD"},
-                                             {"Carrier", carrier},
-                                             {"Receiver", receiver},
-                                             {"Vendor", vendor},
-                                             {"Partner", partner}});
+    auto conNote =
+        host.Make<host::ConNote>({{"ConNoteNo", "ALX00012355"},
+                                  {"ConNoteDate", DateTime::FromParts(2024, 3, 14, 10, 30, 0)},
+                                  {"ScheduledDate", DateTime::FromParts(2024, 3, 15, 9, 0, 0)},
+                                  {"Weight", 0.4 * 100},
+                                  {"Cube", 12.5},
+                                  {"Service", "ROAD"},
+                                  {"Carrier", carrier},
+                                  {"Receiver", receiver},
+                                  {"Vendor", vendor},
+                                  {"Partner", partner}});
     std::vector<std::shared_ptr<MemoryObject<host::Pack>>> list;
     for (int i = 0; i < packs; ++i)
       list.push_back(host.Make<host::Pack>({{"SSCC", "0009312345000010050" + std::to_string(i)}}));
     MemoryHost::Attach(conNote, list);
     LogList log;
-    cls.Process(host.system, conNote, asn, host::Object::As<host::PackList>(conNote->fields["Packs"]), log);
+    cls.Process(host.system, conNote, asn,
+                host::Object::As<host::PackList>(conNote->fields["Packs"]), log);
   }
   std::vector<std::string> Files() const {
     std::vector<std::string> names;
-    for (const auto& entry : fs::directory_iterator(temp.path())) names.push_back(entry.path().filename());
+    for (const auto& entry : fs::directory_iterator(temp.path()))
+      names.push_back(entry.path().filename());
     std::sort(names.begin(), names.end());
     return names;
   }
-  std::string File(const std::string& name) const { return ReadFile(folder + name).value_or("<none>"); }
+  std::string File(const std::string& name) const {
+    return ReadFile(folder + name).value_or("<none>");
+  }
 
   MemoryHost host;
   test::TempFolder temp;
@@ -102,13 +108,15 @@ TEST_F(AlliedExpressSEDIPTest, OneFilePerConsignmentEvenWithinOneSecond) {
   Process(0);
   carrier->fields["FileFolder"] = temp.path();  // the folder may also come without its separator
   Process(1);
-  EXPECT_THAT(Files(), ElementsAre("al_ab12001234_20240314_093000.dat", "al_ab12001234_20240314_093001.dat",
-                                   "al_ab12001234_20240314_093002.dat"));
+  EXPECT_THAT(Files(),
+              ElementsAre("al_ab12001234_20240314_093000.dat", "al_ab12001234_20240314_093001.dat",
+                          "al_ab12001234_20240314_093002.dat"));
   EXPECT_EQ(File("al_ab12001234_20240314_093000.dat"),
             Transmission("5", Delivery("00093123450000100500") + Delivery("00093123450000100501") +
                                   Delivery("00093123450000100502")));
   EXPECT_EQ(File("al_ab12001234_20240314_093001.dat"), Transmission("2", ""));
-  EXPECT_EQ(File("al_ab12001234_20240314_093002.dat"), Transmission("3", Delivery("00093123450000100500")));
+  EXPECT_EQ(File("al_ab12001234_20240314_093002.dat"),
+            Transmission("3", Delivery("00093123450000100500")));
   EXPECT_TRUE(host.logs.empty());
 }
 

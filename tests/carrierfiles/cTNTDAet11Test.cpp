@@ -1,5 +1,3 @@
-#include "carrierfiles/cTNTDAet11.h"
-
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 #include <sys/wait.h>
@@ -10,10 +8,12 @@
 #include <set>
 
 #include "carrierfiles/TailJournal.h"
+#include "carrierfiles/cTNTDAet11.h"
 #include "platform/Clock.h"
 #include "platform/FileSystem.h"
 #include "tests/support/FileSizeLimit.h"
 #include "tests/support/MemoryHost.h"
+#include "tests/support/Records.h"
 #include "tests/support/TempFolder.h"
 
 namespace quendal {
@@ -22,23 +22,18 @@ namespace {
 namespace fs = std::filesystem;
 using test::MemoryHost;
 using test::MemoryObject;
+using test::Pad;
+using test::Sp;
 using ::testing::ElementsAre;
-
-std::string Pad(std::string_view text, std::size_t width) {
-  std::string out(text);
-  if (out.size() < width) out.append(width - out.size(), ' ');
-  return out;
-}
-std::string Sp(std::size_t n) { return std::string(n, ' '); }
 
 // The batch opened by consignment 102 of notice ASN0004501, and the records
 // of a consignment, built from named pieces.
 const std::string kBatch = Pad("102", 10);
 std::string A() { return "A" + Pad("ASN0004501", 20) + Sp(42) + "MEL" + "202403140930" + "11\r\n"; }
 std::string B() {
-  return "B" + kBatch + Pad("TNT01", 15) + Pad("30012345", 10) + Pad("Kestrel Apparel Pty Ltd", 30) +
-         Pad("40 Industry Drive", 30) + Sp(30) + Pad("DANDENONG SOUTH", 20) + "VIC" + "3175" + Sp(33) +
-         "\r\n";
+  return "B" + kBatch + Pad("TNT01", 15) + Pad("30012345", 10) +
+         Pad("Kestrel Apparel Pty Ltd", 30) + Pad("40 Industry Drive", 30) + Sp(30) +
+         Pad("DANDENONG SOUTH", 20) + "VIC" + "3175" + Sp(33) + "\r\n";
 }
 std::string C(std::string_view no, std::string_view service = "76  ") {
   return "C" + kBatch + Pad(no, 15) + "001" + Sp(25) + "HARBOUR Harbour Stores Chadsto" +
@@ -46,19 +41,23 @@ std::string C(std::string_view no, std::string_view service = "76  ") {
          "14032024" + std::string(service) + "0S00" + Sp(42) + "\r\n";
 }
 std::string E(std::string_view no, std::string_view notAfter = "19/03/2024 17:00:00") {
-  return "E" + kBatch + Pad(no, 15) + "0" + Pad("deliver not after date " + std::string(notAfter), 80) + "\r\n";
+  return "E" + kBatch + Pad(no, 15) + "0" +
+         Pad("deliver not after date " + std::string(notAfter), 80) + "\r\n";
 }
 std::string F(std::string_view no, std::string_view packs, std::string_view weight = "00012.250",
               std::string_view kind = "Cartons", std::string_view asn = "ASN0004501") {
-  return "F" + kBatch + Pad(no, 15) + "001" + Pad(asn, 15) + Pad(kind, 20) + Sp(6) + std::string(packs) +
-         std::string(weight) + "KG" + Sp(23) + "00.0350000" + "CO" + Sp(10) + "\r\n";
+  return "F" + kBatch + Pad(no, 15) + "001" + Pad(asn, 15) + Pad(kind, 20) + Sp(6) +
+         std::string(packs) + std::string(weight) + "KG" + Sp(23) + "00.0350000" + "CO" + Sp(10) +
+         "\r\n";
 }
 std::string H(std::string_view no, std::string_view sequence, std::vector<std::string> slots) {
   std::string line = "H" + kBatch + Pad(no, 15) + std::string(sequence);
   for (std::size_t i = 0; i < 8; ++i) line += i < slots.size() ? slots[i] + "  " : Sp(20);
   return line + "\r\n";
 }
-std::string Z(std::string_view count) { return "Z" + Pad("ASN0004501", 20) + std::string(count) + "\r\n"; }
+std::string Z(std::string_view count) {
+  return "Z" + Pad("ASN0004501", 20) + std::string(count) + "\r\n";
+}
 
 std::string Sscc(int i) {
   char text[24];
@@ -86,20 +85,30 @@ class TNTDAet11Test : public ::testing::Test {
                                           {"State", "VIC"},
                                           {"Postcode", "3148"}});
     partner = host.Make<host::Partner>({{"ShortName", "HARBOUR"}});
-    despatch = host.Make<host::Despatch>({{"NotAfter", DateTime::FromParts(2024, 3, 19, 17, 0, 0)}});
+    despatch =
+        host.Make<host::Despatch>({{"NotAfter", DateTime::FromParts(2024, 3, 19, 17, 0, 0)}});
     asn = host.Make<host::ASN>({{"ID", 1}, {"ASNNo", "ASN0004501"}, {"OriginCode", "MELBOURNE"}});
   }
   void TearDown() override { SetNow(std::nullopt); }
 
   std::shared_ptr<MemoryObject<host::ConNote>> ConNote(int id, std::string_view no, int packs,
                                                        Var weight = 12.25) {
-    auto conNote = host.Make<host::ConNote>(
-        {{"ConNoteId", id}, {"ConNoteNo", no}, {"ConNoteDate", DateTime::FromParts(2024, 3, 14, 8, 0, 0)},
-         {"Service", "EXPRESS"}, {"CarrierPrefix", "TNT"}, {"Weight", weight}, {"Volume", 0.035},
-         {"Carrier", carrier}, {"Receiver", receiver}, {"Vendor", vendor}, {"Partner", partner}});
+    auto conNote =
+        host.Make<host::ConNote>({{"ConNoteId", id},
+                                  {"ConNoteNo", no},
+                                  {"ConNoteDate", DateTime::FromParts(2024, 3, 14, 8, 0, 0)},
+                                  {"Service", "EXPRESS"},
+                                  {"CarrierPrefix", "TNT"},
+                                  {"Weight", weight},
+                                  {"Volume", 0.035},
+                                  {"Carrier", carrier},
+                                  {"Receiver", receiver},
+                                  {"Vendor", vendor},
+                                  {"Partner", partner}});
     std::vector<std::shared_ptr<MemoryObject<host::Pack>>> list;
     for (int i = 1; i <= packs; ++i)
-      list.push_back(host.Make<host::Pack>({{"SSCC", Sscc(i)}, {"PackType", "CARTON"}, {"Despatch", despatch}}));
+      list.push_back(host.Make<host::Pack>(
+          {{"SSCC", Sscc(i)}, {"PackType", "CARTON"}, {"Despatch", despatch}}));
     MemoryHost::Attach(conNote, list);
     return conNote;
   }
@@ -129,8 +138,8 @@ class TNTDAet11Test : public ::testing::Test {
 
 TEST_F(TNTDAet11Test, FirstAndSecondConsignmentOfTheDay) {
   Process(ConNote(102, "TNT00012346", 2));
-  const std::string first = A() + B() + C("TNT00012346") + E("TNT00012346") + F("TNT00012346", "00002") +
-                            H("TNT00012346", "001", {Slot(1), Slot(2)});
+  const std::string first = A() + B() + C("TNT00012346") + E("TNT00012346") +
+                            F("TNT00012346", "00002") + H("TNT00012346", "001", {Slot(1), Slot(2)});
   EXPECT_EQ(File(), first + Z("00007"));
 
   // The second joins the batch: no second "A" or "B", the batch number of
@@ -151,15 +160,16 @@ TEST_F(TNTDAet11Test, NinePacksPalletsAndServices) {
   std::vector<std::string> eight;
   for (int i = 1; i <= 8; ++i) eight.push_back(Slot(i));
   EXPECT_EQ(File(), A() + B() + C("TNT00012346") + E("TNT00012346") +
-                        F("TNT00012346", "00009", "00012.250", "Pallets") + H("TNT00012346", "001", eight) +
-                        H("TNT00012346", "002", {Slot(9)}) + Z("00008"));
+                        F("TNT00012346", "00009", "00012.250", "Pallets") +
+                        H("TNT00012346", "001", eight) + H("TNT00012346", "002", {Slot(9)}) +
+                        Z("00008"));
 
   // A carrier prefix outside the table has no service code; no packs still give one "H".
   auto none = ConNote(103, "AAA1", 0);
   none->fields["CarrierPrefix"] = "XYZ";
   Process(none);
   EXPECT_THAT(File(), ::testing::EndsWith(C("AAA1", "    ") + E("AAA1", "") + F("AAA1", "00000") +
-                                           H("AAA1", "001", {}) + Z("00012")));
+                                          H("AAA1", "001", {}) + Z("00012")));
 }
 
 TEST_F(TNTDAet11Test, TheSameBytesAsRewritingTheWholeFile) {
@@ -186,10 +196,9 @@ TEST_F(TNTDAet11Test, AFileThatDoesNotEndInItsTrailerIsLeftAlone) {
   const std::string before = File();
   Process(ConNote(103, "TNT00012347", 1));
   EXPECT_EQ(File(), before);
-  EXPECT_THAT(host.LogMessages(),
-              ElementsAre("Cannot open file to add consignment " + folder,
-                          "ConNote TNT00012347 not added: the last line of " + path +
-                              " is not the trailer of its batch"));
+  EXPECT_THAT(host.LogMessages(), ElementsAre("Cannot open file to add consignment " + folder,
+                                              "ConNote TNT00012347 not added: the last line of " +
+                                                  path + " is not the trailer of its batch"));
   EXPECT_EQ(host.logs[0].at("Procedure").Text(), "Open carrier message file");
 }
 
@@ -208,7 +217,8 @@ TEST_F(TNTDAet11Test, AFailedWriteLeavesTheDayFileAndACrashedOneIsCompleted) {
   // What a crash leaves once the journal of consignment 103 is durable and
   // the file cut at its trailer: the next consignment completes 103 first.
   const std::string two = one.substr(0, one.size() - 28) + C("TNT00012347") + E("TNT00012347") +
-                          F("TNT00012347", "00001") + H("TNT00012347", "001", {Slot(1)}) + Z("00011");
+                          F("TNT00012347", "00001") + H("TNT00012347", "001", {Slot(1)}) +
+                          Z("00011");
   TailJournal journal(path);
   const auto begun = journal.Begin(
       [](const TailJournal::End& end) { return std::optional<std::size_t>(end.bytes.size() - 28); },
@@ -217,7 +227,8 @@ TEST_F(TNTDAet11Test, AFailedWriteLeavesTheDayFileAndACrashedOneIsCompleted) {
   fs::resize_file(path, begun.pending->offset);
   Process(ConNote(104, "TNT00012348", 1));
   EXPECT_EQ(File(), two.substr(0, two.size() - 28) + C("TNT00012348") + E("TNT00012348") +
-                        F("TNT00012348", "00001") + H("TNT00012348", "001", {Slot(1)}) + Z("00015"));
+                        F("TNT00012348", "00001") + H("TNT00012348", "001", {Slot(1)}) +
+                        Z("00015"));
   EXPECT_EQ(host.LogMessages().size(), 0u);
 }
 

@@ -65,19 +65,20 @@ Run ClnDay(const fs::path& folder, int consignments, bool indexed) {
     for (int copy = 0; copy < (i % 500 == 499 ? 2 : 1); ++copy) {
       char number[32];
       std::snprintf(number, sizeof number, "SRXZ%08d", i);
-      auto conNote = host.Make<host::ConNote>({{"ConNoteNo", number},
-                                               {"ConNoteDate", DateTime::FromParts(2024, 3, 14, 8, 0, 0)},
-                                               {"Weight", 4.5},
-                                               {"Volume", 0.02},
-                                               {"Carrier", carrier},
-                                               {"Receiver", receiver}});
+      auto conNote =
+          host.Make<host::ConNote>({{"ConNoteNo", number},
+                                    {"ConNoteDate", DateTime::FromParts(2024, 3, 14, 8, 0, 0)},
+                                    {"Weight", 4.5},
+                                    {"Volume", 0.02},
+                                    {"Carrier", carrier},
+                                    {"Receiver", receiver}});
       char sscc[32];
       std::snprintf(sscc, sizeof sscc, "000931234500%08d", i);
       auto pack = host.Make<host::Pack>({{"SSCC", sscc}, {"ASNId", 501}, {"Despatch", despatch}});
       test::MemoryHost::Attach(conNote, {pack});
       LogList log;
-      cls.Process(host.system, conNote, asn, host::Object::As<host::PackList>(conNote->Get("Packs")),
-                  log);
+      cls.Process(host.system, conNote, asn,
+                  host::Object::As<host::PackList>(conNote->Get("Packs")), log);
       ++sent;
     }
     if ((i + 1) % 1000 == 0) {
@@ -97,8 +98,9 @@ Run Et11Day(const fs::path& folder, int consignments, bool inPlace) {
   test::MemoryHost host;
   fs::remove_all(folder);
   fs::create_directories(folder);
-  auto carrier = host.Make<host::Carrier>(
-      {{"FileFolder", folder.string() + "/"}, {"AccountRef", "TNT01"}, {"AccountNumber", "30012345"}});
+  auto carrier = host.Make<host::Carrier>({{"FileFolder", folder.string() + "/"},
+                                           {"AccountRef", "TNT01"},
+                                           {"AccountNumber", "30012345"}});
   auto vendor = host.Make<host::Vendor>({{"Name", "Kestrel Apparel Pty Ltd"}, {"State", "VIC"}});
   auto receiver = host.Make<host::Receiver>({{"Name", "Harbour Stores Chadstone"},
                                              {"AddressLine2", "Rear loading dock"},
@@ -106,7 +108,8 @@ Run Et11Day(const fs::path& folder, int consignments, bool inPlace) {
                                              {"State", "VIC"},
                                              {"Postcode", "3148"}});
   auto asn = host.Make<host::ASN>({{"ID", 501}, {"ASNNo", "ASN0004501"}, {"OriginCode", "MEL"}});
-  auto despatch = host.Make<host::Despatch>({{"NotAfter", DateTime::FromParts(2024, 3, 19, 17, 0, 0)}});
+  auto despatch =
+      host.Make<host::Despatch>({{"NotAfter", DateTime::FromParts(2024, 3, 19, 17, 0, 0)}});
 
   clsTNTDAet11 cls;
   cls.SetTailReplacement(inPlace);
@@ -115,25 +118,28 @@ Run Et11Day(const fs::path& folder, int consignments, bool inPlace) {
   for (int i = 0; i < consignments; ++i) {
     char number[32];
     std::snprintf(number, sizeof number, "TNT%08d", i);
-    auto conNote = host.Make<host::ConNote>({{"ConNoteId", 100000 + i},
-                                             {"ConNoteNo", number},
-                                             {"ConNoteDate", DateTime::FromParts(2024, 3, 14, 8, 0, 0)},
-                                             {"Service", "EXPRESS"},
-                                             {"CarrierPrefix", "TNT"},
-                                             {"Weight", 4.5},
-                                             {"Volume", 0.02},
-                                             {"Carrier", carrier},
-                                             {"Receiver", receiver},
-                                             {"Vendor", vendor}});
+    auto conNote =
+        host.Make<host::ConNote>({{"ConNoteId", 100000 + i},
+                                  {"ConNoteNo", number},
+                                  {"ConNoteDate", DateTime::FromParts(2024, 3, 14, 8, 0, 0)},
+                                  {"Service", "EXPRESS"},
+                                  {"CarrierPrefix", "TNT"},
+                                  {"Weight", 4.5},
+                                  {"Volume", 0.02},
+                                  {"Carrier", carrier},
+                                  {"Receiver", receiver},
+                                  {"Vendor", vendor}});
     std::vector<std::shared_ptr<test::MemoryObject<host::Pack>>> packs;
     for (int p = 0; p < 2 + i % 8; ++p) {
       char sscc[32];
       std::snprintf(sscc, sizeof sscc, "0009312345%08d%02d", i, p);
-      packs.push_back(host.Make<host::Pack>({{"SSCC", sscc}, {"PackType", "CARTON"}, {"Despatch", despatch}}));
+      packs.push_back(
+          host.Make<host::Pack>({{"SSCC", sscc}, {"PackType", "CARTON"}, {"Despatch", despatch}}));
     }
     test::MemoryHost::Attach(conNote, packs);
     LogList log;
-    cls.Process(host.system, conNote, asn, host::Object::As<host::PackList>(conNote->Get("Packs")), log);
+    cls.Process(host.system, conNote, asn, host::Object::As<host::PackList>(conNote->Get("Packs")),
+                log);
     if ((i + 1) % 1000 == 0) {
       const auto now = Clock::now();
       run.blockSeconds.push_back(std::chrono::duration<double>(now - blockStart).count());
@@ -162,7 +168,8 @@ bool Compare(const char* what, const Run& fast, const std::optional<Run>& refere
     std::printf("%s file: %zu bytes, identical: %s\n", what, fast.file.size(), same ? "yes" : "NO");
   const bool onTarget =
       !fast.blockSeconds.empty() && fast.blockSeconds.back() <= 1.5 * fast.blockSeconds.front();
-  std::printf("%s target (last block at most 1.5 x the first): %s\n\n", what, onTarget ? "met" : "MISSED");
+  std::printf("%s target (last block at most 1.5 x the first): %s\n\n", what,
+              onTarget ? "met" : "MISSED");
   return same && onTarget;
 }
 
@@ -173,7 +180,9 @@ int main(int argc, char** argv) {
   const int consignments = argc > 2 ? std::atoi(argv[2]) : 10000;
   const bool reference = !(argc > 3 && std::string(argv[3]) == "--no-reference");
   if ((which != "cln" && which != "et11" && which != "all") || consignments < 1000) {
-    std::fprintf(stderr, "usage: DayScaling [cln|et11|all] [consignments, at least 1000] [--no-reference]\n");
+    std::fprintf(
+        stderr,
+        "usage: DayScaling [cln|et11|all] [consignments, at least 1000] [--no-reference]\n");
     return 2;
   }
   SetNow(DateTime::FromParts(2024, 3, 14, 9, 0, 0));
@@ -184,14 +193,16 @@ int main(int argc, char** argv) {
     const Run indexed = ClnDay(root / "indexed", consignments, true);
     Report("CLN indexed check", indexed);
     std::optional<Run> scanned;
-    if (reference) Report("CLN whole-file check", *(scanned = ClnDay(root / "scanned", consignments, false)));
+    if (reference)
+      Report("CLN whole-file check", *(scanned = ClnDay(root / "scanned", consignments, false)));
     ok = Compare("CLN", indexed, scanned) && ok;
   }
   if (which != "cln") {
     const Run inPlace = Et11Day(root / "in-place", consignments, true);
     Report("ET11 tail in place", inPlace);
     std::optional<Run> rewritten;
-    if (reference) Report("ET11 whole rewrite", *(rewritten = Et11Day(root / "rewritten", consignments, false)));
+    if (reference)
+      Report("ET11 whole rewrite", *(rewritten = Et11Day(root / "rewritten", consignments, false)));
     ok = Compare("ET11", inPlace, rewritten) && ok;
   }
   fs::remove_all(root);

@@ -4,7 +4,6 @@
 
 #include "frame/VB.h"
 #include "platform/CodePage.h"
-#include "platform/DirectorySpooler.h"
 
 namespace quendal {
 
@@ -142,10 +141,6 @@ bool ConsignmentWriter::CheckFolder(const std::string& folder) {
 
 std::string ConsignmentWriter::CarrierLine(std::string_view utf8) {
   return ToCodePage(utf8) + "\r\n";
-}
-
-std::string ConsignmentWriter::NamePart(std::string_view hostText) {
-  return hostText.empty() ? std::string() : SafeFileName(hostText);
 }
 
 std::string ConsignmentWriter::FormatText(std::string_view text, long length, bool rightAlign) {

@@ -67,10 +67,6 @@ class ConsignmentWriter : public Lifecycle, public ConsignmentInterface {
   // A line of a carrier file: code-page text ended by carriage return and line feed.
   static std::string CarrierLine(std::string_view utf8);
 
-  // A host text as one part of a file name: separators and ".." that would
-  // lead out of the carrier folder are replaced; an empty text stays empty.
-  static std::string NamePart(std::string_view hostText);
-
   std::string aValue_;
   std::string bValue_;
 

@@ -159,7 +159,8 @@ TailJournal::Begun TailJournal::Begin(const FindTail& find, const BuildTail& bui
     const std::optional<std::uint64_t> size = file.Size();
     if (!size) return {Outcome::CannotOpen, {}};
     start = *size > window_ ? *size - window_ : 0;
-    const std::optional<std::string> bytes = file.Read(start, static_cast<std::size_t>(*size - start));
+    const std::optional<std::string> bytes =
+        file.Read(start, static_cast<std::size_t>(*size - start));
     if (!bytes) return {Outcome::CannotOpen, {}};
     end = *bytes;
     at = find(End{end, start});
@@ -168,7 +169,8 @@ TailJournal::Begun TailJournal::Begin(const FindTail& find, const BuildTail& bui
     // A missing file ends in the empty tail of a new file, when the check says so.
     at = find(End{});
     if (at) {
-      if (!file.Open(path_, RandomAccessFile::Mode::CreateIfMissing)) return {Outcome::CannotOpen, {}};
+      if (!file.Open(path_, RandomAccessFile::Mode::CreateIfMissing))
+        return {Outcome::CannotOpen, {}};
       created = true;
     }
   }
@@ -181,8 +183,8 @@ TailJournal::Begun TailJournal::Begin(const FindTail& find, const BuildTail& bui
 
   const std::optional<FileStamp> stamp = file.Stamp();
   if (!stamp) return {Outcome::CannotOpen, {}};
-  Entry entry{stamp->device, stamp->inode, pending.offset, start + end.size(), pending.oldTail,
-              pending.bytes};
+  Entry entry{stamp->device,      stamp->inode,    pending.offset,
+              start + end.size(), pending.oldTail, pending.bytes};
   file.Close();
 
   // The journal's data and size are flushed (fdatasync), then the folder

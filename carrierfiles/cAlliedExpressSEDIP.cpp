@@ -3,6 +3,7 @@
 #include "frame/VB.h"
 #include "frame/host/Read.h"
 #include "platform/Clock.h"
+#include "platform/DirectorySpooler.h"
 #include "platform/FileSystem.h"
 
 namespace quendal {
@@ -32,7 +33,8 @@ std::string Field(const Var& date, std::string_view mask) { return Field(Var(For
 
 clsAlliedExpressSEDIP::clsAlliedExpressSEDIP() : ConsignmentWriter("clsAlliedExpressSEDIP") {}
 
-void clsAlliedExpressSEDIP::Compile(const Ref<host::ConNote>& objConNote, const Ref<host::ASN>& objASN,
+void clsAlliedExpressSEDIP::Compile(const Ref<host::ConNote>& objConNote,
+                                    const Ref<host::ASN>& objASN,
                                     const Ref<host::PackList>& lstPacks) {
   Procedure proc = Guard("Sub Process");
   Ref<host::Carrier> carrier;
@@ -63,16 +65,17 @@ void clsAlliedExpressSEDIP::Compile(const Ref<host::ConNote>& objConNote, const 
             CarrierLine("#Transmission_Date=" + Format(Var(now), "DD/MM/YYYY HH:MM:SS")) +
             CarrierLine("#Num_Record=" + std::to_string(packCount + 2)) + CarrierLine("#SOD");
         // Consignment: receiver's state and city, weight, cube and service.
-        text += CarrierLine("|H|" + Field(objConNote->ConNoteNo()) + "|" + asnNo + "|" +
-                            Field(Read(r, &host::Receiver::State)) + "|" +
-                            Field(Read(r, &host::Receiver::City)) + "|" + Field(objConNote->Weight()) +
-                            "|" + Field(objConNote->Cube()) + "|" + Field(objConNote->Service()) +
-                            "||||||" + "Allied Express" + "|" + asnNo + "||||");
+        text += CarrierLine(
+            "|H|" + Field(objConNote->ConNoteNo()) + "|" + asnNo + "|" +
+            Field(Read(r, &host::Receiver::State)) + "|" + Field(Read(r, &host::Receiver::City)) +
+            "|" + Field(objConNote->Weight()) + "|" + Field(objConNote->Cube()) + "|" +
+            Field(objConNote->Service()) + "||||||" + "Allied Express" + "|" + asnNo + "||||");
         // Pickup: when, and the sender's address.
         const Var date = objConNote->ConNoteDate();
-        text += CarrierLine("|P|" + Field(date, "dd/mm/yyyy") + "|" + Field(date, "hh:mm:ss") + "|" +
-                            Field(Read(v, &host::Vendor::Postcode)) + "|" + Field(Read(v, &host::Vendor::Name)) +
-                            "|" + Field(Read(v, &host::Vendor::AddressLine2)) + "|" +
+        text += CarrierLine("|P|" + Field(date, "dd/mm/yyyy") + "|" + Field(date, "hh:mm:ss") +
+                            "|" + Field(Read(v, &host::Vendor::Postcode)) + "|" +
+                            Field(Read(v, &host::Vendor::Name)) + "|" +
+                            Field(Read(v, &host::Vendor::AddressLine2)) + "|" +
                             Field(Read(v, &host::Vendor::AddressLine3)) + "|" +
                             Field(Read(v, &host::Vendor::State)) + "|||||||" +
                             Field(Read(v, &host::Vendor::AddressLine1)) + "|");
@@ -82,9 +85,10 @@ void clsAlliedExpressSEDIP::Compile(const Ref<host::ConNote>& objConNote, const 
             "|D|" + Field(scheduled, "dd/mm/yyyy") + "|" + Field(scheduled, "hh:mm:ss") + "||" +
             Field(Read(r, &host::Receiver::Postcode)) + "|" +
             Field(Read(objConNote->Partner(), &host::Partner::Code)) + "|" +
-            Field(Read(r, &host::Receiver::AddressLine2)) + "|" + Field(Read(r, &host::Receiver::Suburb)) +
-            "|" + Field(Read(r, &host::Receiver::State)) + "||||" + Field(Read(r, &host::Receiver::Extra1)) +
-            "|" + Field(Read(r, &host::Receiver::Extra2)) + "|";
+            Field(Read(r, &host::Receiver::AddressLine2)) + "|" +
+            Field(Read(r, &host::Receiver::Suburb)) + "|" + Field(Read(r, &host::Receiver::State)) +
+            "||||" + Field(Read(r, &host::Receiver::Extra1)) + "|" +
+            Field(Read(r, &host::Receiver::Extra2)) + "|";
         for (std::int32_t i = 1; i <= packCount; ++i)
           text += CarrierLine(delivery + Field(Read(lstPacks->Item(i), &host::Pack::SSCC)) +
                               "|1||||||||||||||");
@@ -97,7 +101,8 @@ void clsAlliedExpressSEDIP::Compile(const Ref<host::ConNote>& objConNote, const 
   std::string base = folder;
   while (!base.empty() && base.back() == kFolderSeparator) base.pop_back();
   const std::string prefix = base + kFolderSeparator + "al_" +
-                             NamePart(LCase(Read(carrier, &host::Carrier::AccountNumber).Text())) + "_";
+                             SafeNamePart(LCase(Read(carrier, &host::Carrier::AccountNumber).Text())) +
+                             "_";
   proc([&] {
     std::string path;
     for (int second = 0; second < kSecondsToTry; ++second) {
@@ -117,6 +122,8 @@ void clsAlliedExpressSEDIP::Compile(const Ref<host::ConNote>& objConNote, const 
   });
 }
 
-std::unique_ptr<Component> MakeAlliedExpressSEDIP() { return std::make_unique<clsAlliedExpressSEDIP>(); }
+std::unique_ptr<Component> MakeAlliedExpressSEDIP() {
+  return std::make_unique<clsAlliedExpressSEDIP>();
+}
 
 }  // namespace quendal

@@ -9,6 +9,7 @@
 #include "frame/VB.h"
 #include "frame/host/Read.h"
 #include "platform/Clock.h"
+#include "platform/DirectorySpooler.h"
 #include "platform/CodePage.h"
 
 namespace quendal {
@@ -25,7 +26,7 @@ constexpr std::string_view kOpenFile = "Open carrier message file";
 // "A" batch header: batch reference, origin depot, when the batch was
 // started, file version "11".
 constexpr std::array kBatchHeader = {
-    Literal("A"), TextLeft(20),  // batch reference (A-value)
+    Literal("A"),         TextLeft(20),  // batch reference (A-value)
     Spaces(42),
     TextRight(3),  // origin depot
     Date("YYYYMMDDHHMM"), Literal("11"),
@@ -51,9 +52,9 @@ static_assert(Width(kSender) == 186);
 
 // "C" consignment: the receiver, the consignment date and the service.
 constexpr std::array kConsignment = {
-    Literal("C"), TextLeft(10),  // batch number
-    TextLeft(15),                // consignment number
-    Literal("001"), Spaces(25),
+    Literal("C"),     TextLeft(10),  // batch number
+    TextLeft(15),                    // consignment number
+    Literal("001"),   Spaces(25),
     CutLeft(30),   // partner's short name and receiver name
     TextLeft(30),  // receiver street
     Spaces(30),
@@ -63,7 +64,7 @@ constexpr std::array kConsignment = {
     Spaces(33),
     Date("DDMMYYYY"),  // consignment date
     TextLeft(4),       // TNT service code
-    Literal("0S00"), Spaces(42),
+    Literal("0S00"),  Spaces(42),
 };
 static_assert(Width(kConsignment) == 262);
 
@@ -79,15 +80,20 @@ static_assert(Width(kInstruction) == 107);
 // "F" freight: notice, kind and number of packs, weight in kilograms
 // ("KG") and volume in cubic metres ("CO").
 constexpr std::array kFreight = {
-    Literal("F"), TextLeft(10),  // batch number
-    TextLeft(15),                // consignment number
+    Literal("F"),
+    TextLeft(10),  // batch number
+    TextLeft(15),  // consignment number
     Literal("001"),
     TextLeft(15),  // advance ship notice
     TextLeft(20),  // "Pallets" or "Cartons"
     Spaces(6),
     Zero(5),  // packs
-    Number("00000.000"), Literal("KG"), Spaces(23),
-    Number("00.0000000"), Literal("CO"), Spaces(10),
+    Number("00000.000"),
+    Literal("KG"),
+    Spaces(23),
+    Number("00.0000000"),
+    Literal("CO"),
+    Spaces(10),
 };
 static_assert(Width(kFreight) == 131);
 
@@ -119,7 +125,8 @@ std::string AsText(const Var& value) {
 std::vector<std::string_view> CompleteLines(std::string_view bytes) {
   std::vector<std::string_view> lines;
   std::size_t start = 0;
-  for (std::size_t end; (end = bytes.find('\n', start)) != std::string_view::npos; start = end + 1) {
+  for (std::size_t end; (end = bytes.find('\n', start)) != std::string_view::npos;
+       start = end + 1) {
     std::string_view line = bytes.substr(start, end - start);
     if (line.ends_with('\r')) line.remove_suffix(1);
     lines.push_back(line);
@@ -175,19 +182,19 @@ std::optional<Trailer> FindTrailer(const TailJournal::End& end, const Batch& bat
   const std::size_t at = lineBreak == std::string_view::npos ? 0 : lineBreak + 1;
   const std::string_view line = body.substr(at);
 
-  std::vector<std::string> references = {
-      "Z" + ToCodePage(record::Fill(TextLeft(20), Var(batch.aValue)))};
+  std::vector<std::string> references = {"Z" +
+                                         ToCodePage(record::Fill(TextLeft(20), Var(batch.aValue)))};
   // The header's reference field: what stands between "A" and the 59
   // characters of spaces, depot, date and version that end the line.
-  if (batch.header.size() >= 80) references.push_back("Z" + batch.header.substr(1, batch.header.size() - 60));
+  if (batch.header.size() >= 80)
+    references.push_back("Z" + batch.header.substr(1, batch.header.size() - 60));
   for (const std::string& reference : references) {
     if (!line.starts_with(reference)) continue;
     const std::string_view digits = line.substr(reference.size());
     if (digits.size() < 5 || digits.size() > 18) continue;
     std::uint64_t count = 0;
     const auto [next, error] = std::from_chars(digits.data(), digits.data() + digits.size(), count);
-    if (error == std::errc() && next == digits.data() + digits.size())
-      return Trailer{at, count};
+    if (error == std::errc() && next == digits.data() + digits.size()) return Trailer{at, count};
   }
   return std::nullopt;
 }
@@ -208,7 +215,7 @@ void clsTNTDAet11::Compile(const Ref<host::ConNote>& objConNote, const Ref<host:
         carrier = objConNote->Carrier();
         folder = Read(carrier, &host::Carrier::FileFolder).Text();
         // One file per account and day; the folder text ends with its separator.
-        path = folder + NamePart(Read(carrier, &host::Carrier::AccountRef).Text()) +
+        path = folder + SafeNamePart(Read(carrier, &host::Carrier::AccountRef).Text()) +
                Format(Var(Today()), "DDMM") + "1200.TXT";
       }))
     return;
@@ -254,14 +261,16 @@ void clsTNTDAet11::Compile(const Ref<host::ConNote>& objConNote, const Ref<host:
   std::string header;
   if (!existing && !proc([&] {
         const Ref<host::Vendor> vendor = objConNote->Vendor();
-        header = CarrierLine(record::Render(
-                     kBatchHeader, {aValue_, Left(Read(objASN, &host::ASN::OriginCode).Text(), 3), Now()})) +
-                 CarrierLine(record::Render(
-                     kSender, {bValue_, Read(carrier, &host::Carrier::AccountRef),
-                               Read(carrier, &host::Carrier::AccountNumber),
-                               Read(vendor, &host::Vendor::Name), Read(vendor, &host::Vendor::AddressLine2),
-                               Read(vendor, &host::Vendor::Suburb), Read(vendor, &host::Vendor::State),
-                               Read(vendor, &host::Vendor::Postcode)}));
+        header =
+            CarrierLine(record::Render(
+                kBatchHeader,
+                {aValue_, Left(Read(objASN, &host::ASN::OriginCode).Text(), 3), Now()})) +
+            CarrierLine(record::Render(
+                kSender,
+                {bValue_, Read(carrier, &host::Carrier::AccountRef),
+                 Read(carrier, &host::Carrier::AccountNumber), Read(vendor, &host::Vendor::Name),
+                 Read(vendor, &host::Vendor::AddressLine2), Read(vendor, &host::Vendor::Suburb),
+                 Read(vendor, &host::Vendor::State), Read(vendor, &host::Vendor::Postcode)}));
       }))
     return;
 
@@ -269,24 +278,26 @@ void clsTNTDAet11::Compile(const Ref<host::ConNote>& objConNote, const Ref<host:
   std::uint64_t lines = 0;
   if (!proc([&] {
         const Ref<host::Receiver> receiver = objConNote->Receiver();
-        const std::string name = Read(objConNote->Partner(), &host::Partner::ShortName).Text() + " " +
-                                 Read(receiver, &host::Receiver::Name).Text();
+        const std::string name = Read(objConNote->Partner(), &host::Partner::ShortName).Text() +
+                                 " " + Read(receiver, &host::Receiver::Name).Text();
         body = CarrierLine(record::Render(
-            kConsignment, {bValue_, no, name, Read(receiver, &host::Receiver::AddressLine2),
-                           Read(receiver, &host::Receiver::Suburb), Read(receiver, &host::Receiver::State),
-                           Read(receiver, &host::Receiver::Postcode), objConNote->ConNoteDate(),
-                           ServiceCode(ServiceTable::TNTET11, objConNote)}));
+            kConsignment,
+            {bValue_, no, name, Read(receiver, &host::Receiver::AddressLine2),
+             Read(receiver, &host::Receiver::Suburb), Read(receiver, &host::Receiver::State),
+             Read(receiver, &host::Receiver::Postcode), objConNote->ConNoteDate(),
+             ServiceCode(ServiceTable::TNTET11, objConNote)}));
         const Ref<host::Despatch> despatch =
             Read(First(Read(objConNote, &host::ConNote::Packs)), &host::Pack::Despatch);
         body += CarrierLine(record::Render(
             kInstruction,
-            {bValue_, no, "deliver not after date " + AsText(Read(despatch, &host::Despatch::NotAfter))}));
+            {bValue_, no,
+             "deliver not after date " + AsText(Read(despatch, &host::Despatch::NotAfter))}));
         const bool pallets = UCase(Read(First(lstPacks), &host::Pack::PackType).Text()) == "PALLET";
         const double weight = objConNote->Weight().NumberOr(0);
         body += CarrierLine(record::Render(
-            kFreight, {bValue_, no, Read(objASN, &host::ASN::ASNNo), pallets ? "Pallets" : "Cartons",
-                       lstPacks ? lstPacks->Count() : 0, weight > 1 ? weight : 1.0,
-                       objConNote->Volume().NumberOr(0)}));
+            kFreight, {bValue_, no, Read(objASN, &host::ASN::ASNNo),
+                       pallets ? "Pallets" : "Cartons", lstPacks ? lstPacks->Count() : 0,
+                       weight > 1 ? weight : 1.0, objConNote->Volume().NumberOr(0)}));
         lines = 3;
       }))
     return;
@@ -300,7 +311,9 @@ void clsTNTDAet11::Compile(const Ref<host::ConNote>& objConNote, const Ref<host:
         for (std::int32_t first = 1; first <= count || sequence == 0; first += kSlots) {
           std::string line = record::Render(kItems, {bValue_, no, ++sequence});
           for (std::int32_t i = first; i < first + kSlots; ++i) {
-            const Var sscc = i <= count ? Var(Mid(Read(lstPacks->Item(i), &host::Pack::SSCC).Text(), 3, 18)) : Var();
+            const Var sscc =
+                i <= count ? Var(Mid(Read(lstPacks->Item(i), &host::Pack::SSCC).Text(), 3, 18))
+                           : Var();
             line += record::Render(kSlot, {sscc});
           }
           items += CarrierLine(line);
@@ -335,22 +348,25 @@ void clsTNTDAet11::Compile(const Ref<host::ConNote>& objConNote, const Ref<host:
   proc([&] {
     std::uint64_t previous = 0;  // lines before the consignment, the old trailer not counted
     const auto find = [&](const TailJournal::End& end) -> std::optional<std::size_t> {
-      if (!existing) return end.bytes.empty() && end.offset == 0 ? std::optional<std::size_t>(0) : std::nullopt;
+      if (!existing)
+        return end.bytes.empty() && end.offset == 0 ? std::optional<std::size_t>(0) : std::nullopt;
       const std::optional<Trailer> found = FindTrailer(end, batch);
       if (!found || found->count == 0) return std::nullopt;
       previous = found->count - 1;
       return found->at;
     };
     const auto build = [&](std::string_view) {
-      return existing ? body + trailer(previous + lines + 1) : header + body + trailer(2 + lines + 1);
+      return existing ? body + trailer(previous + lines + 1)
+                      : header + body + trailer(2 + lines + 1);
     };
     switch (journal.Replace(find, build)) {
       case TailJournal::Outcome::Replaced:
         return true;
       case TailJournal::Outcome::NoTail:
         LogLine(0, kOpenFile, "Cannot open file to add consignment " + folder);
-        LogLine(0, kOpenFile, "ConNote " + no + " not added: the last line of " + path +
-                                  " is not the trailer of its batch");
+        LogLine(0, kOpenFile,
+                "ConNote " + no + " not added: the last line of " + path +
+                    " is not the trailer of its batch");
         return false;
       case TailJournal::Outcome::CannotOpen:
         LogLine(err::kPathFileAccess, kOpenFile, "Cannot open file " + folder);

@@ -20,8 +20,9 @@ using namespace record;
 // Header "00N" as StarTrack's, but stamped with the time the file was
 // started and of batch type "O".
 constexpr std::array kHeader = {
-    Literal("00N"), TextLeft(12),  // the file's name as the carrier knows it
-    Date("YYYYMMDDHHMMSS"), Literal("O"), Spaces(20), Date("YYYYMMDDHHMMSS"), Literal("Y"), Spaces(71),
+    Literal("00N"),         TextLeft(12),  // the file's name as the carrier knows it
+    Date("YYYYMMDDHHMMSS"), Literal("O"), Spaces(20),
+    Date("YYYYMMDDHHMMSS"), Literal("Y"), Spaces(71),
 };
 static_assert(Width(kHeader) == Width(cln::kHeader));
 
@@ -122,24 +123,31 @@ void clsVicExpressDAcln::Compile(const Ref<host::ConNote>& objConNote, const Ref
           std::string lines;  // added once the step is through, so a retried step adds them once
           if (i == 1) {
             const Ref<host::Receiver> r = objConNote->Receiver();
-            const std::string code = Read(Read(pack, &host::Pack::Carton), &host::Carton::Code).Text();
+            const std::string code =
+                Read(Read(pack, &host::Pack::Carton), &host::Carton::Code).Text();
             lines += CarrierLine(record::Render(
                 kConsignment,
                 {no, Read(r, &host::Receiver::Name), Read(r, &host::Receiver::AddressLine1),
                  Read(r, &host::Receiver::AddressLine2), Read(r, &host::Receiver::Suburb),
                  cln::StateCodeOf(Trim(Read(r, &host::Receiver::State).Text())),
                  Left(Read(r, &host::Receiver::Postcode).Text(), 4),
-                 Read(carrier, &host::Carrier::AccountNumber), packCount, objConNote->Service(), weight,
-                 InStr(code, "PLT") > 0 ? "PAL" : "CTN"}));
+                 Read(carrier, &host::Carrier::AccountNumber), packCount, objConNote->Service(),
+                 weight, InStr(code, "PLT") > 0 ? "PAL" : "CTN"}));
             lines += CarrierLine(record::Render(
                 cln::kReference,
                 {no, "S", Read(objASN, &host::ASN::ASNNo), cln::kAdvanceShipNotice, "Y"}));
             lines += CarrierLine(record::Render(
-                cln::kReference, {no, "S", Read(Read(pack, &host::Pack::Despatch), &host::Despatch::DespatchNo),
-                                  cln::kCustomerOrder, "Y"}));
+                cln::kReference,
+                {no, "S", Read(Read(pack, &host::Pack::Despatch), &host::Despatch::DespatchNo),
+                 cln::kCustomerOrder, "Y"}));
           }
-          if (host::SameValue(Read(pack, &host::Pack::ASNId), Read(objASN, &host::ASN::ID)))
-            lines += CarrierLine(record::Render(cln::kItem, {no, Read(pack, &host::Pack::SSCC), "S "}));
+          // Only a pack of another notice has no item record: a pack whose
+          // notice is not known is still a carton the carrier must be told of.
+          const Var packAsn = Read(pack, &host::Pack::ASNId);
+          const Var asnId = Read(objASN, &host::ASN::ID);
+          if (packAsn.IsNull() || asnId.IsNull() || host::SameValue(packAsn, asnId))
+            lines +=
+                CarrierLine(record::Render(cln::kItem, {no, Read(pack, &host::Pack::SSCC), "S "}));
           records += lines;
         }))
       return;

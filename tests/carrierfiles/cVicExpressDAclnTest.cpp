@@ -143,11 +143,13 @@ TEST_F(VicExpressDAclnTest, PacksWithoutWeightAnEmptyPackListAndAMissingFolder) 
                                    Item("VEX1", "00093123450000100231") +
                                    Item("VEX1", "00093123450000100248"));
 
-  // A long receiver name keeps to its field.
+  // A long receiver name keeps to its field; a pack whose notice is not
+  // known still has its item record.
   receiver->fields["Name"] = std::string(45, 'N');
-  Process("VEX3", {Pack("00093123450000100262", "CTN01", 2)});
+  Process("VEX3", {Pack("00093123450000100262", "CTN01", 2, Var(), Var())});
   const std::string file = File(Name(today));
   EXPECT_EQ(file.substr(file.find("10VEX3"), 283).substr(30, 80), std::string(40, 'N') + Sp(40));
+  EXPECT_THAT(file, ::testing::EndsWith(Item("VEX3", "00093123450000100262")));
 
   carrier->fields["FileFolder"] = temp.path() + "/missing/";
   Process("VEX4", {Pack("00093123450000100279", "CTN01", 2)});

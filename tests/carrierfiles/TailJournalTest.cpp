@@ -4,7 +4,6 @@
 
 #include "carrierfiles/TailJournal.h"
 #include "platform/FileSystem.h"
-#include "tests/support/FileSizeLimit.h"
 #include "tests/support/TempFolder.h"
 
 namespace quendal {
@@ -108,25 +107,6 @@ TEST_F(TailJournalTest, ATornOrStrayJournalIsDroppedAndTheFileLeftAlone) {
   DeleteFile(path);
   EXPECT_EQ(journal.Finish(), Recovery::Dropped);
   EXPECT_FALSE(FileExists(path));
-  EXPECT_FALSE(JournalLeft());
-}
-
-TEST_F(TailJournalTest, AWriteThatFailsLeavesTheFileAsItWas) {
-  const std::string before = "<Day>\r\n" + std::string(3000, 'x') + "\r\n</Day>\r\n";
-  test::WriteText(path, before);
-  {
-    // Room for the journal, not for the longer file.
-    test::FileSizeLimit limit(before.size() + 200);
-    EXPECT_EQ(journal.Replace(ClosingTag, Add(std::string(500, 'y') + "\r\n")), Outcome::Failed);
-  }
-  EXPECT_EQ(Text(), before);
-  EXPECT_FALSE(JournalLeft());
-  {
-    // No room even for the journal: the file is never touched.
-    test::FileSizeLimit limit(100);
-    EXPECT_EQ(journal.Replace(ClosingTag, Add(std::string(500, 'y') + "\r\n")), Outcome::Failed);
-  }
-  EXPECT_EQ(Text(), before);
   EXPECT_FALSE(JournalLeft());
 }
 

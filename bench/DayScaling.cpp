@@ -40,6 +40,33 @@ struct Run {
   std::string file;
 };
 
+// Times each block of 1,000 consignments on the clock on the wall and in processor time.
+class Blocks {
+ public:
+  void Done(int consignments, Run& run) {
+    if (consignments % 1000 != 0) return;
+    const auto now = Clock::now();
+    run.blockSeconds.push_back(std::chrono::duration<double>(now - wall_).count());
+    const std::clock_t cpu = std::clock();
+    run.blockCpuSeconds.push_back(static_cast<double>(cpu - cpu_) / CLOCKS_PER_SEC);
+    wall_ = now;
+    cpu_ = cpu;
+  }
+
+ private:
+  Clock::time_point wall_ = Clock::now();
+  std::clock_t cpu_ = std::clock();
+};
+
+// The day's file (the one with the extension) of a run, and the run's folder removed.
+std::string TakeFile(const fs::path& folder, const std::string& extension) {
+  std::string file;
+  for (const auto& entry : fs::directory_iterator(folder))
+    if (entry.path().extension() == extension) file = ReadFile(entry.path().string()).value_or("");
+  fs::remove_all(folder);
+  return file;
+}
+
 Run ClnDay(const fs::path& folder, int consignments, bool indexed) {
   test::MemoryHost host;
   fs::remove_all(folder);
@@ -60,8 +87,7 @@ Run ClnDay(const fs::path& folder, int consignments, bool indexed) {
   clsStarTrackDAcln cls;
   cls.SetDuplicateIndex(indexed);
   Run run;
-  auto blockStart = Clock::now();
-  std::clock_t cpuStart = std::clock();
+  Blocks blocks;
   int sent = 0;
   for (int i = 0; i < consignments; ++i) {
     // Every 500th consignment is sent a second time right after.
@@ -84,18 +110,9 @@ Run ClnDay(const fs::path& folder, int consignments, bool indexed) {
                   host::Object::As<host::PackList>(conNote->Get("Packs")), log);
       ++sent;
     }
-    if ((i + 1) % 1000 == 0) {
-      const auto now = Clock::now();
-      run.blockSeconds.push_back(std::chrono::duration<double>(now - blockStart).count());
-      blockStart = now;
-      const std::clock_t cpu = std::clock();
-      run.blockCpuSeconds.push_back(static_cast<double>(cpu - cpuStart) / CLOCKS_PER_SEC);
-      cpuStart = cpu;
-    }
+    blocks.Done(i + 1, run);
   }
-  for (const auto& entry : fs::directory_iterator(folder))
-    run.file = ReadFile(entry.path().string()).value_or("");
-  fs::remove_all(folder);
+  run.file = TakeFile(folder, ".CLN");
   return run;
 }
 
@@ -120,8 +137,7 @@ Run Et11Day(const fs::path& folder, int consignments, bool inPlace) {
   clsTNTDAet11 cls;
   cls.SetTailReplacement(inPlace);
   Run run;
-  auto blockStart = Clock::now();
-  std::clock_t cpuStart = std::clock();
+  Blocks blocks;
   for (int i = 0; i < consignments; ++i) {
     char number[32];
     std::snprintf(number, sizeof number, "TNT%08d", i);
@@ -147,18 +163,9 @@ Run Et11Day(const fs::path& folder, int consignments, bool inPlace) {
     LogList log;
     cls.Process(host.system, conNote, asn, host::Object::As<host::PackList>(conNote->Get("Packs")),
                 log);
-    if ((i + 1) % 1000 == 0) {
-      const auto now = Clock::now();
-      run.blockSeconds.push_back(std::chrono::duration<double>(now - blockStart).count());
-      blockStart = now;
-      const std::clock_t cpu = std::clock();
-      run.blockCpuSeconds.push_back(static_cast<double>(cpu - cpuStart) / CLOCKS_PER_SEC);
-      cpuStart = cpu;
-    }
+    blocks.Done(i + 1, run);
   }
-  for (const auto& entry : fs::directory_iterator(folder))
-    if (entry.path().extension() == ".TXT") run.file = ReadFile(entry.path().string()).value_or("");
-  fs::remove_all(folder);
+  run.file = TakeFile(folder, ".TXT");
   return run;
 }
 

@@ -1,18 +1,19 @@
-// Pieces for building expected fixed-width records in tests.
+// Pieces of expected fixed-width records: a text padded to its field, and spaces.
 #pragma once
 
+#include <cstddef>
 #include <string>
 #include <string_view>
 #include <vector>
 
 namespace quendal::test {
 
-// The text padded with spaces on the right to `width`.
 inline std::string Pad(std::string_view text, std::size_t width) {
   std::string out(text);
   if (out.size() < width) out.append(width - out.size(), ' ');
   return out;
 }
+
 inline std::string Sp(std::size_t n) { return std::string(n, ' '); }
 
 // The lines of a carrier file, each without its CR LF ending.

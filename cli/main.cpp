@@ -367,10 +367,12 @@ int Main(int argc, char** argv) {
                    "without a terminal it shows none.");
 
   auto* report = app.add_subcommand(
-      "report",
-      "ConsolidatedManifestPrint: the consignment summary (\"Consignment Summary Print\") of the days "
-      "FROM to TO of a vendor and carrier. A class that sums up its own manifest has none here "
-      "(result 2): its summary comes with `quendal manifest`.");
+      "report", "ConsolidatedManifestPrint: the consignment summary of a vendor and carrier's days");
+  report->footer(
+      "Prints the \"Consignment Summary Print\" of the consignments dated FROM to TO (both "
+      "included). A class that sums up its own manifest has nothing to list here (result 2): its "
+      "summary comes with `quendal manifest`. Results: 0 produced, 1 the host gave no consignment "
+      "list, 2 no consignments, 3 not produced.");
   report->add_option("--class", o.className, "row class that prints the summary")->required();
   report->add_option("--from", o.from, "first day: YYYY-MM-DD or dd/mm/yyyy")->required();
   report->add_option("--to", o.to, "last day, included")->required();

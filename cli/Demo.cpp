@@ -114,6 +114,11 @@ int RunDemo(const std::string& out, std::ostream& cout, bool asJson) {
     std::ofstream(drawn / "printer.ini") << "dpi=300\n";
   }
   fs::create_directories(root / "spool" / SafeFileName(data.documentPrinter));
+  for (const DemoFile& file : data.files) {
+    std::ofstream out(file.path, std::ios::binary);
+    out << file.text;
+    if (!out) throw OpenFailure("cannot write " + file.path);
+  }
 
   std::shared_ptr<mvserver::SqliteHost> host;
   try {

@@ -9,6 +9,8 @@ std::unique_ptr<Component> MakeStarTrackGenericSCM();
 std::unique_ptr<Component> MakeeParcelManifestxml();
 std::unique_ptr<Component> MakeeParcelManifestEODxml();
 std::unique_ptr<Component> MakeStarTrackDAcln();
+std::unique_ptr<Component> MakeVLODAcsv();
+std::unique_ptr<Component> MakeTNTTransactionDAcsv();
 
 namespace {
 
@@ -29,7 +31,7 @@ constexpr std::array kCatalogue = {
     CatalogueEntry{"clsIpecDA1256", Consignment, "Ipec", "1256 file", nullptr},
     CatalogueEntry{"clsVicExpressDAcln", Consignment, "VicExpress", "consignment file (\".CTN\")",
                    nullptr},
-    CatalogueEntry{"clsVLODAcsv", Consignment, "VLO", "map-driven CSV file", nullptr},
+    CatalogueEntry{"clsVLODAcsv", Consignment, "VLO", "map-driven CSV file", MakeVLODAcsv},
     CatalogueEntry{"clsMayneCMLSCM", Label, "Mayne", "CML", nullptr},
     CatalogueEntry{"clsMayneGenericSCM", Label, "Mayne", "any retailer", nullptr},
     CatalogueEntry{"clsStarTrackGenericSCM", Label, "StarTrack", "any retailer (reference class)",
@@ -47,7 +49,7 @@ constexpr std::array kCatalogue = {
     CatalogueEntry{"clsStarTrackHSSCM", Label, "StarTrack", "HS", nullptr},
     CatalogueEntry{"clsTollMYERSCM", Label, "Toll", "Myer", nullptr},
     CatalogueEntry{"clsTNTTransactionDAcsv", Consignment, "TNT", "map-driven CSV transaction file",
-                   nullptr},
+                   MakeTNTTransactionDAcsv},
     CatalogueEntry{"clsAlliedExpressSEDIP", Consignment, "Allied Express", "SEDIP file", nullptr},
     CatalogueEntry{"clsStarTrackRebelSCM", Label, "StarTrack", "Rebel", nullptr},
     CatalogueEntry{"clsIFSAPISCM", Label, "IFS", "any retailer", nullptr},

@@ -70,12 +70,14 @@ bool MapCsvWriter::OpenMapFile(const std::string& sMapFileName) {
           LogLine(0, kOpenMap, file + " is empty.");
           return false;
         }
-        if (size <= kMapFileLimit) bytes = ReadFile(sMapFileName);
-        if (!bytes) {
-          LogLine(err::kPathFileAccess, kOpenMap, file + " cannot be read.");
-          return false;
+        if (size <= kMapFileLimit) {
+          bytes = ReadFile(sMapFileName);
+          if (!bytes) {
+            LogLine(err::kPathFileAccess, kOpenMap, file + " cannot be read.");
+            return false;
+          }
         }
-        if (bytes->size() <= kMapFileLimit) return true;
+        if (bytes && bytes->size() <= kMapFileLimit) return true;
         LogLine(0, kOpenMap,
                 file + " is too large: a map file holds at most " + std::to_string(kMapFileLimit) +
                     " bytes.");

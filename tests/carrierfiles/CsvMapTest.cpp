@@ -44,16 +44,15 @@ TEST(CsvMapTest, LinesThatNameNoFieldKeepTheirColumnAndAreNotedOnce) {
                           "line 4 names no field: \"WHATEVER\"; its column is written empty.",
                           "line 5 is too long to name a field (70000 bytes); its column is written empty."));
   EXPECT_TRUE(ReadCsvMap("\r\n \r\n\t", kNames).columns.empty());
-}
 
-TEST(CsvMapTest, ADamagedFileCannotFloodTheLog) {
-  std::string bytes = "PACKWEIGHT\n";
-  for (int i = 0; i < 500; ++i) bytes += "BAD\x01" + std::to_string(i) + "\xC3\xA9\n";
-  const CsvMap map = ReadCsvMap(bytes, kNames);
-  EXPECT_EQ(map.columns.size(), 501u);
-  ASSERT_EQ(map.notes.size(), 11u);
-  EXPECT_EQ(map.notes[0], "line 2 names no field: \"BAD?0??\"; its column is written empty.");
-  EXPECT_EQ(map.notes[10], "490 more lines name no field; their columns are written empty.");
+  // A damaged file can't flood the log; what a note shows of a name is printable.
+  std::string damaged = "PACKWEIGHT\n";
+  for (int i = 0; i < 500; ++i) damaged += "BAD\x01" + std::to_string(i) + "\xC3\xA9\n";
+  const CsvMap flood = ReadCsvMap(damaged, kNames);
+  EXPECT_EQ(flood.columns.size(), 501u);
+  ASSERT_EQ(flood.notes.size(), 11u);
+  EXPECT_EQ(flood.notes[0], "line 2 names no field: \"BAD?0??\"; its column is written empty.");
+  EXPECT_EQ(flood.notes[10], "490 more lines name no field; their columns are written empty.");
 }
 
 TEST(CsvMapTest, OnlyValuesThatWouldSplitTheLineAreQuoted) {

@@ -13,20 +13,17 @@ using test::MapText;
 using ::testing::ElementsAre;
 
 const std::vector<std::string> kVloNames = {
-    "SUPPLIERNO",       "CUSTOMERCODE",     "SHIPNOTENO",         "SHIPNOTEDATE",
-    "SHIPNOTETIME",     "SHIPNOTETYPECODE", "SHIPNOTESTATUS",     "BILLOFLADING",
-    "BOOKINGNO",        "ORDERNO",          "ORDERDATE",          "ORDERSTATUSCODE",
-    "POVERSIONNO",      "INVOICENO",        "DELREFERENCE",       "PARTNERSUPPLIERNO",
-    "COMPANYCODE",      "CONSIGNMENTNOTENO", "CARRIERNAME",       "CARRIERACCOUNTREF",
-    "CARRIERSERVICECODE", "CARRIERRUNCODE", "SENDERNAME",         "SENDERADDR1",
-    "SENDERADDR2",      "SENDERTOWN",       "SENDERSTATE",        "SENDERPOSTCODE",
-    "SENDERCONTACT",    "RECEIVERNAME",     "RECEIVERADDR1",      "RECEIVERADDR2",
-    "RECEIVERTOWN",     "RECEIVERSTATE",    "RECEIVERPOSTCODE",   "RECEIVERCONTACT",
-    "DELIVERYDATE",     "SCHEDULEDATE",     "SCHEDULETIME",       "DATESHIPPED",
-    "SHIPTOCODE",       "PALLETNO",         "PALLETMARKTYPE",     "PALLETTYPECODE",
-    "CONTAINERNO",      "SHIPPACKCODE",     "SHIPMENTWEIGHT",     "SHIPMENTVOLUME",
-    "SHIPMENTCOUNT",    "PACKMARKTYPE",     "PACKAGETYPECODE",    "PACKWEIGHT",
-    "PACKLENGTH",       "PACKWIDTH",        "PACKHEIGHT",         "BUYSTORECODE"};
+    "SUPPLIERNO", "CUSTOMERCODE", "SHIPNOTENO", "SHIPNOTEDATE", "SHIPNOTETIME", "SHIPNOTETYPECODE",
+    "SHIPNOTESTATUS", "BILLOFLADING", "BOOKINGNO", "ORDERNO", "ORDERDATE", "ORDERSTATUSCODE",
+    "POVERSIONNO", "INVOICENO", "DELREFERENCE", "PARTNERSUPPLIERNO", "COMPANYCODE",
+    "CONSIGNMENTNOTENO", "CARRIERNAME", "CARRIERACCOUNTREF", "CARRIERSERVICECODE", "CARRIERRUNCODE",
+    "SENDERNAME", "SENDERADDR1", "SENDERADDR2", "SENDERTOWN", "SENDERSTATE", "SENDERPOSTCODE",
+    "SENDERCONTACT", "RECEIVERNAME", "RECEIVERADDR1", "RECEIVERADDR2", "RECEIVERTOWN",
+    "RECEIVERSTATE", "RECEIVERPOSTCODE", "RECEIVERCONTACT", "DELIVERYDATE", "SCHEDULEDATE",
+    "SCHEDULETIME", "DATESHIPPED", "SHIPTOCODE", "PALLETNO", "PALLETMARKTYPE", "PALLETTYPECODE",
+    "CONTAINERNO", "SHIPPACKCODE", "SHIPMENTWEIGHT", "SHIPMENTVOLUME", "SHIPMENTCOUNT",
+    "PACKMARKTYPE", "PACKAGETYPECODE", "PACKWEIGHT", "PACKLENGTH", "PACKWIDTH", "PACKHEIGHT",
+    "BUYSTORECODE"};
 
 // Every field of one pack of the fixture's consignment, in catalogue order.
 std::string VloLine(std::string_view sscc, std::string_view shipPackCode,
@@ -111,8 +108,11 @@ TEST_F(VLODAcsvTest, WithoutAMapNothingIsWrittenUntilTheMapIsThere) {
   Process(vlo, ConNote());
   Map("VLODA.map", " \r\n\t\r\n");
   Process(vlo, ConNote());
+  Map("VLODA.map", "CONTAINERNO\r\n" + std::string(70000, ' '));
+  Process(vlo, ConNote());
   EXPECT_THAT(host.LogMessages(),
-              ElementsAre(file + " does not exist.", file + " is empty.", file + " is empty."));
+              ElementsAre(file + " does not exist.", file + " is empty.", file + " is empty.",
+                          file + " is too large: a map file holds at most 65536 bytes."));
   EXPECT_FALSE(FileExists(folder + "VLO_1403240930.txt"));
 
   Map("VLODA.map", "CONTAINERNO");

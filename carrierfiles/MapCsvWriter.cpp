@@ -104,9 +104,9 @@ std::int32_t MapCsvWriter::Load(const std::string&, Grid&) {
   std::int32_t result = 0;
   Procedure proc = Guard("Function Load");
   proc([&] {
-    LogLine(0, "Load",
-            "No Packs found to process. " + ClassName() +
-                " takes consignments through Process only.");
+    LogLine(
+        0, "Load",
+        "No Packs found to process. " + ClassName() + " takes consignments through Process only.");
   });
   return result;
 }
@@ -183,13 +183,14 @@ void MapCsvWriter::Compile(const Ref<host::ConNote>& objConNote, const Ref<host:
       }))
     return;
   for (const std::string& sscc : added) {
-    if (!proc([&] { LogLine(0, "Process Pack", "......Pack " + sscc + " added to ConNote " + no); }))
+    if (!proc(
+            [&] { LogLine(0, "Process Pack", "......Pack " + sscc + " added to ConNote " + no); }))
       return;
   }
   if (!proc([&] {
-        LogLine(0, "Process", "ASN " + Read(objASN, &host::ASN::ASNNo).Text() +
-                                  " VLO DA compile completed. " + std::to_string(packCount) +
-                                  " packs added.");
+        LogLine(0, "Process",
+                "ASN " + Read(objASN, &host::ASN::ASNNo).Text() + " VLO DA compile completed. " +
+                    std::to_string(packCount) + " packs added.");
       }))
     return;
   proc([&] { CloseOpenFile(); });

@@ -11,6 +11,10 @@ namespace {
 
 using namespace csv;
 
+Var ScheduledDay(const CsvPack& p) {
+  return Format(p.Of(&host::ConNote::ScheduledDate), "yyyymmdd");
+}
+
 // The fields a VLO map file may name, in VLO's order, and how each is
 // filled for a pack; a field without a filler is written empty.
 constexpr std::array kFields = {
@@ -68,14 +72,9 @@ constexpr std::array kFields = {
     CsvField{"RECEIVERSTATE", ReceiverState},
     CsvField{"RECEIVERPOSTCODE", ReceiverPostcode},
     CsvField{"RECEIVERCONTACT", ReceiverContact},
-    CsvField{"DELIVERYDATE",
-             [](const CsvPack& p) -> Var {
-               return Format(p.Of(&host::ConNote::ScheduledDate), "yyyymmdd");
-             }},
-    CsvField{"SCHEDULEDATE",
-             [](const CsvPack& p) -> Var {
-               return Format(p.Of(&host::ConNote::ScheduledDate), "yyyymmdd");
-             }},
+    // The day the consignment is booked for is also the day it is to be delivered.
+    CsvField{"DELIVERYDATE", ScheduledDay},
+    CsvField{"SCHEDULEDATE", ScheduledDay},
     CsvField{"SCHEDULETIME",
              [](const CsvPack& p) -> Var {
                return Format(p.Of(&host::ConNote::ScheduledDate), "HHMM");
@@ -93,7 +92,7 @@ constexpr std::array kFields = {
     CsvField{"SHIPPACKCODE",
              [](const CsvPack& p) -> Var {
                return p.Of(&host::Pack::PackType).IsNull() ? Var("CTN25")
-                                                            : p.Of(&host::Carton::Code);
+                                                           : p.Of(&host::Carton::Code);
              }},
     CsvField{"SHIPMENTWEIGHT", ShipmentWeight},
     CsvField{"SHIPMENTVOLUME", ShipmentVolume},

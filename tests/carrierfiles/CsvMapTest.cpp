@@ -22,7 +22,9 @@ TEST(CsvMapTest, LineEndsAndByteOrderMarksOfAnyEditorGiveTheSameColumns) {
   EXPECT_EQ(Columns("CONTAINERNO\nPACKWEIGHT\nCONSIGNMENTNOTENO"), expected);
   EXPECT_EQ(Columns("CONTAINERNO\r\nPACKWEIGHT\r\nCONSIGNMENTNOTENO\r\n"), expected);
   EXPECT_EQ(Columns("CONTAINERNO\rPACKWEIGHT\rCONSIGNMENTNOTENO\r"), expected);
-  EXPECT_EQ(Columns("\xEF\xBB\xBF" "CONTAINERNO\r\nPACKWEIGHT\nCONSIGNMENTNOTENO"), expected);
+  EXPECT_EQ(Columns("\xEF\xBB\xBF"
+                    "CONTAINERNO\r\nPACKWEIGHT\nCONSIGNMENTNOTENO"),
+            expected);
   // UTF-16 as Notepad saves "Unicode", little- and big-endian.
   const std::string_view ascii = "ContainerNo\r\nPackWeight\r\nConsignmentNoteNo\r\n";
   std::string little = "\xFF\xFE", big = "\xFE\xFF";
@@ -36,13 +38,16 @@ TEST(CsvMapTest, LineEndsAndByteOrderMarksOfAnyEditorGiveTheSameColumns) {
 
 TEST(CsvMapTest, LinesThatNameNoFieldKeepTheirColumnAndAreNotedOnce) {
   const std::string longLine(70000, 'X');
-  const CsvMap map = ReadCsvMap("CONTAINERNO\n\n \t\nWHATEVER\n" + longLine + "\nwhatever\n\n\n", kNames);
+  const CsvMap map =
+      ReadCsvMap("CONTAINERNO\n\n \t\nWHATEVER\n" + longLine + "\nwhatever\n\n\n", kNames);
   EXPECT_THAT(map.columns, ElementsAre(1, kNoField, kNoField, kNoField, kNoField, kNoField));
-  EXPECT_THAT(map.notes,
-              ElementsAre("line 2 is blank; its column is written empty.",
-                          "line 3 is blank; its column is written empty.",
-                          "line 4 names no field: \"WHATEVER\"; its column is written empty.",
-                          "line 5 is too long to name a field (70000 bytes); its column is written empty."));
+  EXPECT_THAT(
+      map.notes,
+      ElementsAre(
+          "line 2 is blank; its column is written empty.",
+          "line 3 is blank; its column is written empty.",
+          "line 4 names no field: \"WHATEVER\"; its column is written empty.",
+          "line 5 is too long to name a field (70000 bytes); its column is written empty."));
   EXPECT_TRUE(ReadCsvMap("\r\n \r\n\t", kNames).columns.empty());
 
   // A damaged file can't flood the log; what a note shows of a name is printable.
@@ -57,7 +62,8 @@ TEST(CsvMapTest, LinesThatNameNoFieldKeepTheirColumnAndAreNotedOnce) {
 
 TEST(CsvMapTest, OnlyValuesThatWouldSplitTheLineAreQuoted) {
   std::string line;
-  for (std::string_view value : {"plain", "", "a,b", "say \"hi\"", "two\nlines", "cr\r", "tab\there"}) {
+  for (std::string_view value :
+       {"plain", "", "a,b", "say \"hi\"", "two\nlines", "cr\r", "tab\there"}) {
     if (!line.empty()) line += ',';
     AppendCsvValue(line, value);
   }

@@ -25,8 +25,8 @@ class MapCsvFixture : public ::testing::Test {
   void SetUp() override {
     SetNow(DateTime::FromParts(2024, 3, 14, 9, 7, 30));
     folder = temp.path() + "/";
-    carrier = host.Make<host::Carrier>(
-        {{"FileFolder", folder + "VLO"}, {"AccountNumber", "70067890"}});
+    carrier =
+        host.Make<host::Carrier>({{"FileFolder", folder + "VLO"}, {"AccountNumber", "70067890"}});
     receiver = host.Make<host::Receiver>({{"Name", "Harbour Stores DC"},
                                           {"AddressLine1", "1 Distribution Way"},
                                           {"Suburb", "TRUGANINA"},
@@ -54,7 +54,7 @@ class MapCsvFixture : public ::testing::Test {
   void TearDown() override { SetNow(std::nullopt); }
 
   std::shared_ptr<MemoryObject<host::Pack>> Pack(std::string_view sscc, std::string_view carton,
-                                                  const Var& packType, double weight) {
+                                                 const Var& packType, double weight) {
     const bool pallet = carton == "PLT01";
     auto c = host.Make<host::Carton>({{"Code", carton},
                                       {"Length", pallet ? 1.2 : 0.4},
@@ -77,18 +77,18 @@ class MapCsvFixture : public ::testing::Test {
   // A pallet, a carton of no stated type and a carton; `count` of them.
   std::shared_ptr<MemoryObject<host::ConNote>> ConNote(std::string_view no = "VLO00012345",
                                                        int count = 3) {
-    auto conNote = host.Make<host::ConNote>(
-        {{"ConNoteNo", no},
-         {"ConNoteDate", DateTime::FromParts(2024, 3, 14, 8, 30, 0)},
-         {"Service", "EXPRESS"},
-         {"CarrierPrefix", "VLO"},
-         {"Weight", 27.456},
-         {"Volume", 0.125},
-         {"BillOfLading", "BOL7700"},
-         {"BookingNo", "BK2200"},
-         {"ScheduledDate", DateTime::FromParts(2024, 3, 15, 9, 5, 0)},
-         {"OrderStatusFlag", true},
-         {"Carrier", carrier}});
+    auto conNote =
+        host.Make<host::ConNote>({{"ConNoteNo", no},
+                                  {"ConNoteDate", DateTime::FromParts(2024, 3, 14, 8, 30, 0)},
+                                  {"Service", "EXPRESS"},
+                                  {"CarrierPrefix", "VLO"},
+                                  {"Weight", 27.456},
+                                  {"Volume", 0.125},
+                                  {"BillOfLading", "BOL7700"},
+                                  {"BookingNo", "BK2200"},
+                                  {"ScheduledDate", DateTime::FromParts(2024, 3, 15, 9, 5, 0)},
+                                  {"OrderStatusFlag", true},
+                                  {"Carrier", carrier}});
     std::vector<std::shared_ptr<MemoryObject<host::Pack>>> packs = {
         Pack(kCsvSscc[0], "PLT01", "PALLET", 310.5), Pack(kCsvSscc[1], "CTN01", Var(), 8.125),
         Pack(kCsvSscc[2], "CTN01", "CARTON", 12)};

@@ -71,25 +71,28 @@ CsvMap ReadCsvMap(std::string_view bytes, std::span<const std::string_view> cata
   map.columns.reserve(used);
   std::size_t unnamed = 0;
   std::set<std::string> unknown;
-  const auto note = [&](std::string phrase) {
-    if (++unnamed <= kNotesShown) map.notes.push_back(std::move(phrase));
+  // A note says what is wrong with a line; beyond the first few they are only counted.
+  const auto note = [&](std::size_t line, const auto& what) {
+    if (++unnamed <= kNotesShown)
+      map.notes.push_back("line " + std::to_string(line) + what() +
+                          "; its column is written empty.");
   };
   for (std::size_t i = 0; i < used; ++i) {
-    const std::string line = "line " + std::to_string(i + 1);
     const std::string_view name = TrimBlanks(lines[i]);
     std::ptrdiff_t field = kNoField;
     if (name.empty()) {
-      note(line + " is blank; its column is written empty.");
+      note(i + 1, [] { return std::string(" is blank"); });
     } else if (name.size() > kMapNameLimit) {
-      note(line + " is too long to name a field (" + std::to_string(name.size()) +
-           " bytes); its column is written empty.");
+      note(i + 1, [&] {
+        return " is too long to name a field (" + std::to_string(name.size()) + " bytes)";
+      });
     } else {
       const std::string upper = AsciiUpper(name);
       const auto it = std::find(catalogue.begin(), catalogue.end(), upper);
       if (it != catalogue.end())
         field = it - catalogue.begin();
       else if (unknown.insert(upper).second)
-        note(line + " names no field: \"" + ShownText(name) + "\"; its column is written empty.");
+        note(i + 1, [&] { return " names no field: \"" + ShownText(name) + "\""; });
     }
     map.columns.push_back(field);
   }

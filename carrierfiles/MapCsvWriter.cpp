@@ -63,21 +63,18 @@ bool MapCsvWriter::OpenMapFile(const std::string& sMapFileName) {
         return false;
       }))
     return result;
-  // The length is looked at first, so a huge file is never read.
+  // At most one byte more than a map file may hold is read, so a huge file costs nothing.
   if (!proc([&] {
-        const std::uintmax_t size = FileSize(sMapFileName).value_or(0);
-        if (size == 0) {
+        if (FileSize(sMapFileName).value_or(0) == 0) {
           LogLine(0, kOpenMap, file + " is empty.");
           return false;
         }
-        if (size <= kMapFileLimit) {
-          bytes = ReadFile(sMapFileName);
-          if (!bytes) {
-            LogLine(err::kPathFileAccess, kOpenMap, file + " cannot be read.");
-            return false;
-          }
+        bytes = ReadFileHead(sMapFileName, kMapFileLimit + 1);
+        if (!bytes) {
+          LogLine(err::kPathFileAccess, kOpenMap, file + " cannot be read.");
+          return false;
         }
-        if (bytes && bytes->size() <= kMapFileLimit) return true;
+        if (bytes->size() <= kMapFileLimit) return true;
         LogLine(0, kOpenMap,
                 file + " is too large: a map file holds at most " + std::to_string(kMapFileLimit) +
                     " bytes.");
@@ -133,8 +130,7 @@ void MapCsvWriter::Compile(const Ref<host::ConNote>& objConNote, const Ref<host:
   std::string path;
   if (!proc([&] {
         // The name's start is a host text: it may not lead out of the folder.
-        path = folder + (start.empty() ? std::string() : SafeFileName(start)) + "_" +
-               Format(Var(Now()), "ddmmyyhhss") + ".txt";
+        path = folder + SafeNamePart(start) + "_" + Format(Var(Now()), "ddmmyyhhss") + ".txt";
         if (File().Open(path)) return true;
         LogLine(err::kPathFileAccess, kOpenFile, "Cannot open file " + path);
         return false;

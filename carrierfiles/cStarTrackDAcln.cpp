@@ -69,6 +69,9 @@ ReceiverBlock Receiver(const Ref<host::ConNote>& conNote) {
     block.line2 = rLine1.empty() ? std::string() : rLine2;
     block.suburb = Read(r, &host::Receiver::Suburb).Text();
   }
+  // The name field holds 40 characters whichever source fills it; a longer
+  // name would shift every later field of the record.
+  block.name = Left(block.name, 40);
   const std::string aState = Read(a, &host::Address::State).Text();
   if (!aState.empty()) {
     block.stateCode = cln::StateCodeOf(Trim(aState));
@@ -137,10 +140,11 @@ std::string clsStarTrackDAcln::TargetFile(const Ref<host::ConNote>& conNote,
                                           const std::string& folder) {
   const std::string ref = Read(carrier, &host::Carrier::AccountRef).Text();
   const std::string number = Read(asn, &host::ASN::ASNNumber).Text();
-  // Host texts make the name; what would lead out of the folder is replaced.
-  const std::string newName = SafeFileName(
-      Len(ref) >= 3 ? Left(ref, 3) + Format(Var(Right(number, 5)), "00000") + ".CLN"
-                    : ref + number + ".CLN");
+  // Each host text is made safe on its own, so nothing in it can lead out
+  // of the folder or reach into the extension.
+  const std::string newName =
+      Len(ref) >= 3 ? SafeNamePart(Left(ref, 3)) + SafeNamePart(Format(Var(Right(number, 5)), "00000")) + ".CLN"
+                    : SafeNamePart(ref) + SafeNamePart(number) + ".CLN";
 
   // A consignment dated after today, or on a day that has its folder
   // already, goes to the day's folder.
@@ -304,7 +308,11 @@ void clsStarTrackDAcln::Compile(const Ref<host::ConNote>& objConNote, const Ref<
             records += CarrierLine(
                 record::Render(cln::kReference, {no, "E", value, cln::kAuthorityToLeave, "N"}));
           }
-          if (!host::SameValue(Read(pack, &host::Pack::ASNId), Read(objASN, &host::ASN::ID))) return;
+          // Only a pack of another notice is skipped: a pack whose notice is not
+          // known (Null) is still a carton the carrier must be told of.
+          const Var packAsn = Read(pack, &host::Pack::ASNId);
+          const Var asnId = Read(objASN, &host::ASN::ID);
+          if (!packAsn.IsNull() && !asnId.IsNull() && !host::SameValue(packAsn, asnId)) return;
           const std::string code = Read(Read(pack, &host::Pack::Carton), &host::Carton::Code).Text();
           const std::string tail = pallets > 0 && cartons > 0 ? "S "
                                    : InStr(code, "PLT") > 0  ? "B PAL"

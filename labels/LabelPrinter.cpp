@@ -211,20 +211,20 @@ bool LabelPrinter::OpenPtr() {
       return result;
     if (!installed) return result;
     if (!proc([&] {
-          dc_ = CurrentSpooler().CreateDC(printerName_);
+          long error = 0;
+          dc_ = CurrentSpooler().CreateDC(printerName_, error);
           if (!dc_)
             WriteLog(0, "OpenPtr",
-                     "Error " + std::to_string(err::kUnknownPrinter) + "Unable to open printer " +
-                         printerName_);
+                     "Error " + std::to_string(error) + "Unable to open printer " + printerName_);
         }))
       return result;
   }
   if (!proc([&] { PumpMessages(); })) return result;
   // Hold the job back while the printer's queue is full.
   if (!proc([&] {
-        // Mode 2 never waits; nor does an unset mode, which compares as neither.
+        // Mode 2 never waits; any other mode, an unset one included, waits.
         const Var mode = system_->SpoolerMode();
-        if (mode.IsNull() || mode.Number() == 2) return;
+        if (!mode.IsNull() && mode.IsNumeric() && mode.Number() == 2) return;
         while (SpooledJobCount(handle_) >= kQueueFull) {
           std::this_thread::sleep_for(kQueuePoll);
           PumpMessages();

@@ -93,13 +93,32 @@ Parties ReadParties(const Ref<host::ConNote>& conNote) {
   if (!order) order = Read(First(conNote->Packs()), &host::Pack::Order);
   const Ref<host::Address> a = Read(order, &host::Order::DeliveryAddress);
   auto text = [](const Var& value) { return value.Text(); };
+  // A delivery to a store or distribution centre has no named delivery
+  // address: the consignee is then the consignment's receiver.
+  std::string name = text(Read(a, &host::Address::Name));
+  std::string line1, line2, suburb, state, postcode;
+  if (!name.empty()) {
+    line1 = text(Read(a, &host::Address::Line1));
+    line2 = text(Read(a, &host::Address::Line2));
+    suburb = text(Read(a, &host::Address::Suburb));
+    state = text(Read(a, &host::Address::State));
+    postcode = text(Read(a, &host::Address::Postcode));
+  } else {
+    const Ref<host::Receiver> r = conNote->Receiver();
+    name = text(Read(r, &host::Receiver::Name));
+    line1 = text(Read(r, &host::Receiver::AddressLine1));
+    line2 = text(Read(r, &host::Receiver::AddressLine2));
+    suburb = text(Read(r, &host::Receiver::Suburb));
+    state = text(Read(r, &host::Receiver::State));
+    postcode = text(Read(r, &host::Receiver::Postcode));
+  }
   p.rows = {
-      {text(Read(v, &host::Vendor::Name)), text(Read(a, &host::Address::Name))},
-      {text(Read(v, &host::Vendor::AddressLine1)), text(Read(a, &host::Address::Line1))},
-      {text(Read(v, &host::Vendor::AddressLine2)), text(Read(a, &host::Address::Line2))},
-      {text(Read(v, &host::Vendor::AddressLine3)), text(Read(a, &host::Address::Suburb))},
+      {text(Read(v, &host::Vendor::Name)), name},
+      {text(Read(v, &host::Vendor::AddressLine1)), line1},
+      {text(Read(v, &host::Vendor::AddressLine2)), line2},
+      {text(Read(v, &host::Vendor::AddressLine3)), suburb},
       {text(Read(v, &host::Vendor::State)) + "  " + text(Read(v, &host::Vendor::Postcode)),
-       text(Read(a, &host::Address::State)) + "  " + text(Read(a, &host::Address::Postcode))},
+       state + "  " + postcode},
   };
   p.carrier = text(Read(conNote->Carrier(), &host::Carrier::Name));
   p.conNoteNo = conNote->ConNoteNo().Text();

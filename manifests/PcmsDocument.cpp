@@ -2,6 +2,7 @@
 
 #include <filesystem>
 #include <system_error>
+#include <unordered_set>
 
 #include "frame/Error.h"
 #include "frame/VB.h"
@@ -212,10 +213,29 @@ std::size_t Document::ConsignmentCount() const {
   return count;
 }
 
-void Document::AppendConsignmentsOf(const Document& other) {
+namespace {
+
+std::string_view NumberOf(pugi::xml_node consignment) {
+  return FindChild(consignment, "ConsignmentNumber").text().get();
+}
+
+}  // namespace
+
+std::vector<std::string> Document::AppendConsignmentsOf(const Document& other) {
   pugi::xml_node target = PCMSManifest();
-  for (pugi::xml_node child : other.PCMSManifest().children())
-    if (LocalName(child) == "PCMSConsignment") target.append_copy(child);
+  std::unordered_set<std::string> held;
+  for (pugi::xml_node child : target.children())
+    if (LocalName(child) == "PCMSConsignment") held.emplace(NumberOf(child));
+  std::vector<std::string> leftOut;
+  for (pugi::xml_node child : other.PCMSManifest().children()) {
+    if (LocalName(child) != "PCMSConsignment") continue;
+    if (!held.emplace(NumberOf(child)).second) {
+      leftOut.emplace_back(NumberOf(child));
+      continue;
+    }
+    target.append_copy(child);
+  }
+  return leftOut;
 }
 
 std::string Document::FileText() const {
@@ -250,7 +270,7 @@ DayFileWritten WriteDayFile(const std::string& path, const Document& run) {
       written.unreadable.push_back(candidate);
       continue;
     }
-    day->AppendConsignmentsOf(run);
+    written.alreadyInFile = day->AppendConsignmentsOf(run);
     Store(candidate, day->FileText());
     written.path = candidate;
     return written;

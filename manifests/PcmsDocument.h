@@ -61,8 +61,10 @@ class Document {
   // The PCMSManifest element under body; empty while the tree has none.
   pugi::xml_node PCMSManifest() const;
   std::size_t ConsignmentCount() const;
-  // Appends copies of the other document's PCMSConsignment elements.
-  void AppendConsignmentsOf(const Document& other);
+  // Appends copies of the other document's PCMSConsignment elements whose
+  // ConsignmentNumber this tree does not hold yet, and returns the numbers
+  // of those left out: a consignment is never twice in one manifest.
+  std::vector<std::string> AppendConsignmentsOf(const Document& other);
 
   // The file: declaration, wrapper start tag, the tree indented by two
   // spaces a level, and the wrapper end tag; every line ends with CR LF;
@@ -77,6 +79,7 @@ class Document {
 struct DayFileWritten {
   std::string path;                     // the file that now holds the run
   std::vector<std::string> unreadable;  // day's files kept because they could not be read
+  std::vector<std::string> alreadyInFile;  // consignment numbers the file held before
 };
 
 // Adds the run's consignments to the day's file at `path` (creating it when

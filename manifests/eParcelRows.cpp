@@ -22,9 +22,6 @@ constexpr std::array<GridColumn, 5> kColumns = {{
 }};
 constexpr std::size_t kRowColumns = 6;
 
-// A piece of a file name from host text: nothing in it may lead out of the carrier's folder.
-std::string NamePart(const std::string& text) { return text.empty() ? text : SafeFileName(text); }
-
 void AppendContentsItem(pugi::xml_node parent) {
   pcms::AppendText(parent.append_child("ContentsItem"), "GoodsDescription", "Apparel");
 }
@@ -100,23 +97,41 @@ std::int32_t eParcelRows::ProcessRow(Procedure& proc, const Ref<host::ConNote>& 
         }))
       return result;
   }
+  // The run's document is kept only once a whole consignment is in it: a
+  // first row whose consignment cannot be read leaves no header behind.
+  std::unique_ptr<pcms::Document> started;
   if (!proc([&] {
         if (document_) return;
         manifestNumber_ = variant_.manifestRecord ? manifest_->ManifestNumber().Text()
                                                   : Format(Var(Now()), "YYMMDDHHMM");
         fileName_ = carrier_->FileFolder().Text() + DayFileName();
-        StartDocument(conNote);
+        started = StartDocument(conNote);
       }))
     return result;
-  if (!document_) return result;
+  pcms::Document* document = document_ ? document_.get() : started.get();
+  if (!document) return result;
   bool appended = false;
+  bool listed = false;
   if (!proc([&] {
-        CreatePCMSConsignment(document_->PCMSManifest(), conNote);
+        const std::string number =
+            pcms::ConsignmentNumber(carrier_->AccountRef(), conNote->ConNoteNo());
+        if (document_ && runNumbers_.contains(number)) {
+          listed = true;
+          WriteLog(0, "Process",
+                   "Consignment " + number + " is already in this manifest; it is not added again.");
+          vtErrorLog = {LastLogId()};
+          return;
+        }
+        CreatePCMSConsignment(document->PCMSManifest(), conNote);
         appended = true;
+        if (started) runNumbers_.clear();
+        runNumbers_.insert(number);
       }))
     return result;
+  if (listed) return result;
   // A consignment that is not in the document is neither stamped nor reported done.
   if (!appended) return result;
+  if (started) document_ = std::move(started);
   if (variant_.manifestRecord) {
     if (!proc([&] {
           conNote->SetManifestId(manifest_->ManifestId());
@@ -153,6 +168,15 @@ bool eParcelRows::TermWork(Procedure& proc) {
   // Nothing written: the run's consignments stay for another Term.
   if (written.path.empty()) return false;
   document_.reset();
+  runNumbers_.clear();
+  for (const std::string& number : written.alreadyInFile) {
+    if (!proc([&] {
+          WriteLog(0, "Term",
+                   "Consignment " + number + " is already in the manifest file " + written.path +
+                       "; it is not added again.");
+        }))
+      return false;
+  }
   for (const std::string& kept : written.unreadable) {
     if (!proc([&] {
           WriteLog(0, "Term",
@@ -166,8 +190,7 @@ bool eParcelRows::TermWork(Procedure& proc) {
   return true;
 }
 
-void eParcelRows::StartDocument(const Ref<host::ConNote>& conNote) {
-  // Built aside and kept only when whole.
+std::unique_ptr<pcms::Document> eParcelRows::StartDocument(const Ref<host::ConNote>& conNote) {
   auto document = std::make_unique<pcms::Document>();
   CreatePCMSHeader(document->SendPCMSManifest(), conNote);
   pugi::xml_node manifest =
@@ -177,12 +200,12 @@ void eParcelRows::StartDocument(const Ref<host::ConNote>& conNote) {
   const std::string now = pcms::TransactionTime(Now());
   pcms::AppendText(manifest, "DateSubmitted", now);
   pcms::AppendText(manifest, "DateLodged", now);
-  document_ = std::move(document);
+  return document;
 }
 
 std::string eParcelRows::DayFileName() {
-  return NamePart(Left(UCase(carrier_->AccountRef().Text()), 4)) + "_" + NamePart(manifestNumber_) +
-         "_" + NamePart(carrier_->Options().Text()) + ".xml";
+  return SafeNamePart(Left(UCase(carrier_->AccountRef().Text()), 4)) + "_" + SafeNamePart(manifestNumber_) +
+         "_" + SafeNamePart(carrier_->Options().Text()) + ".xml";
 }
 
 std::optional<std::string> eParcelRows::TodaysFile() {

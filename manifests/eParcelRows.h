@@ -7,6 +7,7 @@
 #include <optional>
 #include <pugixml.hpp>
 #include <string>
+#include <unordered_set>
 #include <vector>
 
 #include "manifests/PcmsDocument.h"
@@ -84,8 +85,8 @@ class eParcelRows : public RowWriter {
   static void AppendArticle(pugi::xml_node parent, const Article& article,
                             const std::string& weight);
 
-  // Makes the run's document: header, body and the PCMSManifest fields.
-  void StartDocument(const Ref<host::ConNote>& conNote);
+  // A new document for the run: header, body and the PCMSManifest fields.
+  std::unique_ptr<pcms::Document> StartDocument(const Ref<host::ConNote>& conNote);
   // The name of a new day's file: account, manifest number and carrier options.
   std::string DayFileName();
   // The first file of the scanned folder created today whose name ends in ".XML".
@@ -93,6 +94,8 @@ class eParcelRows : public RowWriter {
 
   const eParcelVariant& variant_;
   std::unique_ptr<pcms::Document> document_;
+  // The consignment numbers in document_.
+  std::unordered_set<std::string> runNumbers_;
   std::string manifestNumber_;
 };
 

@@ -216,11 +216,12 @@ class CupsDC : public DeviceContext {
 
 }  // namespace
 
-std::unique_ptr<DeviceContext> CupsSpooler::CreateDC(const std::string& printer) {
+std::unique_ptr<DeviceContext> CupsSpooler::CreateDC(const std::string& printer, long& error) {
   for (const InstalledPrinter& p : InstalledPrinters())
     if (p.name == printer)
       return std::make_unique<CupsDC>(*this, printer,
                                       static_cast<int>(std::lround(1440.0 / p.twipsPerPixelX)));
+  error = err::kUnknownPrinter;
   return nullptr;
 }
 

@@ -32,7 +32,7 @@ class CupsSpooler : public Spooler {
   std::vector<InstalledPrinter> InstalledPrinters() override;
   // Pages drawn into a PDF document (a 100 x 150 mm page at the queue's
   // resolution) that goes to the queue as one job when the document ends.
-  std::unique_ptr<DeviceContext> CreateDC(const std::string& printer) override;
+  std::unique_ptr<DeviceContext> CreateDC(const std::string& printer, long& error) override;
 
   // Starts a document of the given MIME type (StartDoc starts a raw one).
   std::int32_t StartDocAs(std::int32_t handle, const std::string& documentName,

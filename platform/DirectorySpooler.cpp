@@ -38,6 +38,10 @@ std::string SafeFileName(std::string_view name) {
   return out;
 }
 
+std::string SafeNamePart(std::string_view text) {
+  return text.empty() ? std::string() : SafeFileName(text);
+}
+
 DirectorySpooler::DirectorySpooler(std::string root) : root_(std::move(root)) {}
 
 std::string DirectorySpooler::PrinterFolder(const std::string& name) const {
@@ -244,9 +248,12 @@ class DirectoryDC : public DeviceContext {
 
 }  // namespace
 
-std::unique_ptr<DeviceContext> DirectorySpooler::CreateDC(const std::string& printer) {
-  if (printer.empty() || SafeFileName(printer) != printer || !FolderExists(PrinterFolder(printer)))
+std::unique_ptr<DeviceContext> DirectorySpooler::CreateDC(const std::string& printer,
+                                                         long& error) {
+  if (printer.empty() || SafeFileName(printer) != printer || !FolderExists(PrinterFolder(printer))) {
+    error = err::kUnknownPrinter;
     return nullptr;
+  }
   return std::make_unique<DirectoryDC>(*this, printer);
 }
 

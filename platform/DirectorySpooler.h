@@ -43,7 +43,7 @@ class DirectorySpooler : public Spooler {
   void ClosePrinter(std::int32_t handle) override;
   std::int32_t JobCount(std::int32_t handle, std::int32_t limit) override;
   std::vector<InstalledPrinter> InstalledPrinters() override;
-  std::unique_ptr<DeviceContext> CreateDC(const std::string& printer) override;
+  std::unique_ptr<DeviceContext> CreateDC(const std::string& printer, long& error) override;
 
   // Installs what draws the previews of the printers whose printer.ini says
   // preview=yes (none by default).
@@ -87,5 +87,9 @@ class DirectorySpooler : public Spooler {
 // A file name made safe: path separators, "..", control characters and
 // characters that file systems refuse become "_".
 std::string SafeFileName(std::string_view name);
+// A piece of a file name taken from host text, made safe the same way on its
+// own; an empty piece stays empty. Build a name from safe pieces and fixed
+// parts, so that no host text can reach into the extension or the folder.
+std::string SafeNamePart(std::string_view text);
 
 }  // namespace quendal

@@ -13,10 +13,15 @@ std::function<void()>& Pump() {
 
 std::optional<std::string> ComputerName() {
   char buf[256] = {};
-  if (gethostname(buf, sizeof buf - 1) != 0 || buf[0] == '\0') return std::nullopt;
-  std::string name = buf;
-  if (name.size() > 30) name.resize(30);
-  return name;
+  if (gethostname(buf, sizeof buf - 1) != 0) return std::nullopt;
+  return ComputerNameFrom(buf);
+}
+
+std::optional<std::string> ComputerNameFrom(std::string_view hostName) {
+  // The name must fit a buffer of 30 characters with its terminating zero;
+  // a longer one is not given at all rather than cut.
+  if (hostName.empty() || hostName.size() >= 30) return std::nullopt;
+  return std::string(hostName);
 }
 
 void PumpMessages() {

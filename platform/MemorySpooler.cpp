@@ -97,8 +97,15 @@ class MemoryDC : public DeviceContext {
 
 }  // namespace
 
-std::unique_ptr<DeviceContext> MemorySpooler::CreateDC(const std::string& printer) {
-  if (!printers_.contains(printer)) return nullptr;
+std::unique_ptr<DeviceContext> MemorySpooler::CreateDC(const std::string& printer, long& error) {
+  if (!printers_.contains(printer)) {
+    error = err::kUnknownPrinter;
+    return nullptr;
+  }
+  if (dcError != 0) {
+    error = dcError;
+    return nullptr;
+  }
   auto job = std::make_shared<DrawnJob>();
   job->printer = printer;
   drawnJobs.push_back(job);

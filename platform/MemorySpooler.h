@@ -30,7 +30,7 @@ class MemorySpooler : public Spooler {
   void ClosePrinter(std::int32_t handle) override;
   std::int32_t JobCount(std::int32_t handle, std::int32_t limit) override;
   std::vector<InstalledPrinter> InstalledPrinters() override;
-  std::unique_ptr<DeviceContext> CreateDC(const std::string& printer) override;
+  std::unique_ptr<DeviceContext> CreateDC(const std::string& printer, long& error) override;
 
   // A drawn job: what was drawn on it, page by page.
   struct DrawnJob {
@@ -45,6 +45,8 @@ class MemorySpooler : public Spooler {
   // When set, answers the queue length instead of counting jobs; called once per question.
   std::function<std::int32_t(const std::string& printer)> queueLength;
   int opens = 0;
+  // When non-zero, CreateDC fails with this system error code.
+  long dcError = 0;
   // Printers opened and not closed yet.
   std::size_t OpenHandles() const { return open_.size(); }
 

@@ -37,8 +37,10 @@ class Spooler {
   // Jobs waiting in the printer's queue, at most `limit`.
   virtual std::int32_t JobCount(std::int32_t handle, std::int32_t limit) = 0;
   virtual std::vector<InstalledPrinter> InstalledPrinters() = 0;
-  // A device context for drawing on an installed printer; null when it can't be made.
-  virtual std::unique_ptr<DeviceContext> CreateDC(const std::string& printer) = 0;
+  // A device context for drawing on an installed printer; null when it
+  // can't be made, with `error` set to the system error code (1801 for a
+  // printer the spooler does not know).
+  virtual std::unique_ptr<DeviceContext> CreateDC(const std::string& printer, long& error) = 0;
 };
 
 // Installs the process-wide spooler and returns the previous one.

@@ -305,6 +305,42 @@ TEST_F(StarTrackDAclnTest, ReceiverBlockSources) {
                                            Pad("PORT MELBOURNE", 30) + "3" + "3207");
 }
 
+TEST_F(StarTrackDAclnTest, NameFieldHoldsFortyCharactersWhateverItsSource) {
+  // Each source of the name with 45 characters: the delivery address, the
+  // receiver, and the receiver's first line before its name.
+  const std::string long45 = std::string(40, 'L') + "TAILS";
+  auto recordOf = [&](std::string_view no) {
+    const std::string file = File("SRX00501.CLN");
+    const std::size_t at = file.find("10" + Pad(no, 20));
+    return file.substr(at, file.find("\r\n", at) - at);
+  };
+  address->fields["Name"] = long45;
+  Process(ConNote("N1", 1));
+  address->fields["Name"] = Var();
+  address->fields["State"] = Var();
+  receiver->fields["Name"] = long45;
+  Process(ConNote("N2", 1));
+  despatch->fields["DeliveryText1"] = "Ring bell";
+  Process(ConNote("N3", 1));
+  for (const char* no : {"N1", "N2", "N3"}) {
+    const std::string record = recordOf(no);
+    EXPECT_EQ(record.size(), 281u) << no;
+    EXPECT_EQ(record.substr(278), "CTN") << no;
+  }
+  EXPECT_EQ(recordOf("N1").substr(30, 40), std::string(40, 'L'));
+  EXPECT_EQ(recordOf("N3").substr(30, 41), Pad("12 Wharf Road " + std::string(26, 'L'), 40) + " ");
+}
+
+TEST_F(StarTrackDAclnTest, APackWithoutANoticeIsStillAnItem) {
+  auto c = ConNote(kNo, 2);
+  std::dynamic_pointer_cast<MemoryObject<host::Pack>>(PacksOf(c)->Item(2).ptr())->fields["ASNId"] = Var();
+  Process(c);
+  EXPECT_EQ(File("SRX00501.CLN"), Header("SRX00501.CLN") + Consignment(kNo, "   2") + Window() +
+                                      References() + Item(kSscc[0]) + Item(kSscc[1]));
+  EXPECT_THAT(host.LogMessages(), ::testing::Contains("SSCC " + std::string(kSscc[1]) +
+                                                      " added to CLN for ConNote " + std::string(kNo)));
+}
+
 TEST_F(StarTrackDAclnTest, ItemTailsForPalletsAndCartons) {
   auto mixed = ConNote(kNo, 5);
   auto packs = PacksOf(mixed);
@@ -432,6 +468,14 @@ TEST_F(StarTrackDAclnTest, NamesFromHostTextsStayInsideTheFolder) {
   EXPECT_THAT(names, ElementsAre("S_______x.CLN", "___00501.CLN"));
   EXPECT_FALSE(fs::exists(root / "00501.CLN"));
   EXPECT_FALSE(fs::exists(root / "x.CLN"));
+
+  // A host text that ends in a dot never reaches into the extension.
+  fs::remove_all(root / "carrier");
+  fs::create_directories(root / "carrier");
+  carrier->fields["AccountRef"] = "A.";
+  asn->fields["ASNNumber"] = "";
+  Process(ConNote("SRXZ00012347", 1));
+  EXPECT_TRUE(fs::exists(root / "carrier" / "A..CLN"));
 }
 
 TEST_F(StarTrackDAclnTest, NullHostDataDoesNotStopTheFile) {

@@ -6,6 +6,7 @@
 
 #include "labels/WinPrint.h"
 #include "platform/RecordingCanvas.h"
+#include "tests/support/MemoryHost.h"
 
 namespace quendal {
 namespace {
@@ -32,6 +33,32 @@ TEST(WinPrintDrawTest, BarcodeModulesAreStrokesOneModuleWide) {
   EXPECT_EQ(canvas.primitives[1].x1, 121);
   // The last bar ends the stop pattern: the symbol is modules x 6 pixels wide.
   EXPECT_EQ(canvas.primitives.back().x1, 115 + 6 * static_cast<int>(modules.size() - 1));
+}
+
+// A page whose drawing fails, as a device that has gone away would.
+class FailingCanvas : public RecordingCanvas {
+ public:
+  void Text(int, int, std::string_view, const CanvasFont&, Colour, Colour) override {
+    throw std::runtime_error("device lost");
+  }
+  void Rectangle(int, int, int, int, int) override { throw std::runtime_error("device lost"); }
+};
+
+TEST(WinPrintDrawTest, FailuresAreReportedByTheDrawingRoutines) {
+  auto prompt = std::make_shared<test::ScriptedPrompt>(
+      std::deque<Answer>{Answer::Ignore, Answer::Ignore, Answer::Ignore});
+  test::PromptScope scope(prompt);
+  FailingCanvas canvas;
+  PrintText(canvas, 4.8f, 4.8f, "TO:", 5, 5, 3, 3, 0, 400, "ARIAL", kBlack, kWhite);
+  PrintLine(canvas, 4.8f, 4.8f, 0, 16, 98, 16, 2.0f);
+  EAN128Barcode(canvas, 4.8f, 4.8f, "~20100093123450000000012", 10, 114, 34, 0.5f);
+  ASSERT_EQ(prompt->messages.size(), 3u);
+  EXPECT_NE(prompt->messages[0].find("occured in module mWinPrint, Sub PrintText, line 1."),
+            std::string::npos);
+  EXPECT_NE(prompt->messages[1].find("occured in module mWinPrint, Sub PrintLine, line 1."),
+            std::string::npos);
+  EXPECT_NE(prompt->messages[2].find("occured in module mWinPrint, Sub EAN128Barcode, line 2."),
+            std::string::npos);
 }
 
 TEST(WinPrintDrawTest, LinesAndTexts) {

@@ -452,6 +452,12 @@ TEST_F(StarTrackGenericTest, QueueWait) {
   EXPECT_EQ(answers.size(), 1u);
   EXPECT_EQ(pumps, 3);
 
+  // An unset mode is not mode 2: the queue is looked at too.
+  host.system->fields["SpoolerMode"] = Var();
+  answers = {999, 998};
+  EXPECT_EQ(Printed(pack), kOrdinary);
+  EXPECT_EQ(answers.size(), 1u);
+
   // Spooler mode 2 never looks at the queue.
   host.system->fields["SpoolerMode"] = 2;
   spooler->queueLength = [](const std::string&) -> std::int32_t {
@@ -486,6 +492,12 @@ TEST_F(StarTrackGenericTest, DrawnPrinterIsFoundByItsExactName) {
   EXPECT_TRUE(host.logs.empty());
   EXPECT_TRUE(label.Init(host.system, "office laser"));
   EXPECT_FALSE(label.PrintLabel(pack));
+
+  // A page that cannot be made is logged with the spooler's own error code.
+  spooler->dcError = 5;
+  EXPECT_TRUE(label.Init(host.system, "Office Laser"));
+  EXPECT_TRUE(label.PrintLabel(pack));
+  EXPECT_EQ(host.LogMessages().back(), "Error 5Unable to open printer Office Laser");
 }
 
 }  // namespace

@@ -96,6 +96,26 @@ class DangerousGoodsDeclarationTest : public ::testing::Test {
   std::shared_ptr<MemoryObject<host::ConNote>> conNote;
 };
 
+TEST_F(DangerousGoodsDeclarationTest, AStoreDeliveryNamesTheConsignmentsReceiver) {
+  // The order of a store delivery has no delivery address of its own.
+  order->fields["DeliveryAddress"] = host.Make<host::Address>();
+  conNote->fields["Receiver"] = host.Make<host::Receiver>({{"Name", "Harbour Retail DC"},
+                                                           {"AddressLine1", "12 Wharf Road"},
+                                                           {"AddressLine2", "Gate 4"},
+                                                           {"Suburb", "PORT MELBOURNE"},
+                                                           {"State", "VIC"},
+                                                           {"Postcode", "3207"}});
+  Packs({{{aerosol, 1}}});
+  ASSERT_TRUE(Print());
+  ASSERT_TRUE(Print(DeclarationForm::DFE));
+  const auto docs = Documents();
+  ASSERT_EQ(docs.size(), 2u);
+  for (const std::string& text : docs)
+    for (const char* phrase :
+         {"Harbour Retail DC", "12 Wharf Road", "Gate 4", "PORT MELBOURNE", "VIC 3207"})
+      EXPECT_THAT(text, HasSubstr(phrase));
+}
+
 TEST_F(DangerousGoodsDeclarationTest, StarTrackDocumentCarriesPartiesNotesAndGoods) {
   Packs({{{perfume, 4}, {soap, 1}}});
   ASSERT_TRUE(Print());

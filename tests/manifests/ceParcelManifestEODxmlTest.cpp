@@ -1,5 +1,7 @@
 #include <gtest/gtest.h>
 
+#include <algorithm>
+
 #include "manifests/ceParcelManifestEODxml.h"
 #include "tests/manifests/eParcelFixture.h"
 
@@ -57,6 +59,27 @@ TEST_F(eParcelEndOfDayTest, EachRunLooksForTheDayFileWhereItsClassKeepsIt) {
             (Strings{"NPP10000301", "NPP10000302"}));
   Run("Quendal.clseParcelManifestxml", {0});
   EXPECT_EQ(FilesInFolder(), (Strings{"NPP1_1000_EP.xml", "NPP1_1001_EP.xml", "edi"}));
+}
+
+TEST_F(eParcelEndOfDayTest, AnEndOfDayRunAfterTheManifestRunAddsEachConsignmentOnce) {
+  ClockOnRealDate();
+  AddConNote(301, "NPP0000301", 1, JSmith());
+  AddConNote(302, "NPP0000302", 2, JSmith());
+  Run("Quendal.clseParcelManifestxml", {0, 1});
+  AddConNote(303, "NPP0000303", 1, JSmith());
+  Run(kEndOfDayClass, {0, 1, 2});
+
+  ASSERT_EQ(FilesInFolder(), Strings{"NPP1_1000_EP.xml"});
+  EXPECT_EQ(Values("NPP1_1000_EP.xml", "//ConsignmentNumber"),
+            (Strings{"NPP10000301", "NPP10000302", "NPP10000303"}));
+  // The manifest run's articles stay as they were written.
+  EXPECT_EQ(Values("NPP1_1000_EP.xml", "//ArticleNumber").size(), 4u);
+  const Strings messages = host.LogMessages();
+  for (const char* number : {"NPP10000301", "NPP10000302"})
+    EXPECT_EQ(std::count(messages.begin(), messages.end(),
+                         "Consignment " + std::string(number) + " is already in the manifest file " +
+                             folder + "NPP1_1000_EP.xml; it is not added again."),
+              1);
 }
 
 }  // namespace

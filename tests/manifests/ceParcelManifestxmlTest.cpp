@@ -276,6 +276,44 @@ TEST_F(eParcelManifestTest, NothingIsWrittenWithoutAConsignmentInTheDocument) {
   EXPECT_TRUE(FilesInFolder().empty());
 }
 
+TEST_F(eParcelManifestTest, AConsignmentThatCannotBeReadLeavesNoDocumentBehind) {
+  // A pack without an order: the consignment cannot be read (error 91).
+  auto orderless = host.Make<host::ConNote>({{"ConNoteId", 110},
+                                             {"ConNoteNo", "NPP0000110"},
+                                             {"Vendor", vendor},
+                                             {"Carrier", carrier}});
+  MemoryHost::Attach(orderless, {host.Make<host::Pack>({{"Despatch", host.Make<host::Despatch>(
+                                                                          {{"DespatchNo", "PO110"}})}})});
+  auto prompt = std::make_shared<test::ScriptedPrompt>();  // answers Abort
+  test::PromptScope scope(prompt);
+  EXPECT_EQ(Run(kManifestClass, {0}), (std::vector<std::int32_t>{1, 0}));
+  EXPECT_TRUE(FilesInFolder().empty());
+
+  // With a readable consignment after it, only that one is written, and the
+  // header names it. (The first run's manifest record was made: this run has the next.)
+  ExpressToJSmith();
+  EXPECT_EQ(Run(kManifestClass, {0, 1}), (std::vector<std::int32_t>{2, 0, 102}));
+  ASSERT_EQ(FilesInFolder(), Strings{"NPP1_1001_EP.xml"});
+  EXPECT_EQ(Values("NPP1_1001_EP.xml", "//ConsignmentNumber"), Strings{"NPP10000077"});
+  EXPECT_EQ(Values("NPP1_1001_EP.xml", "//TransactionId"), Strings{"PO778812"});
+}
+
+TEST_F(eParcelManifestTest, ARowProcessedTwiceIsInTheManifestOnce) {
+  ExpressToJSmith();
+  auto object = CreateObject(kManifestClass).object;
+  auto* rows = as<RowInterface>(object);
+  Grid columns, grid;
+  rows->Init(host.system, 7, columns);
+  rows->Load("", grid);
+  LogList log;
+  EXPECT_EQ(rows->Process(0, log), 102);
+  EXPECT_EQ(rows->Process(0, log), 0);
+  EXPECT_EQ(host.LogMessages().back(),
+            "Consignment NPP10000077 is already in this manifest; it is not added again.");
+  EXPECT_TRUE(rows->Term());
+  EXPECT_EQ(Values("NPP1_1000_EP.xml", "//ConsignmentNumber"), Strings{"NPP10000077"});
+}
+
 TEST_F(eParcelManifestTest, HostTextsComeOutEscapedAndWellFormed) {
   auto order = MakeOrder({{"Name", "Smith & Sons <Pty> \"Ltd\""},
                           {"Line1", "Café Straße 5\x01\ttab"},

@@ -70,8 +70,10 @@ TEST_F(DirectorySpoolerTest, DrawnJobsArePngPagesAtThePrintersResolution) {
   ASSERT_TRUE(AppendFile((root / "Dock Zebra/printer.ini").string(),
                          "dpi=203\nwidth_mm=50.8\nheight_mm=25.4\n"));
   DirectorySpooler spooler(root.string());
-  EXPECT_FALSE(spooler.CreateDC("dock zebra"));  // names are exact
-  auto dc = spooler.CreateDC("Dock Zebra");
+  long error = 0;
+  EXPECT_FALSE(spooler.CreateDC("dock zebra", error));  // names are exact
+  EXPECT_EQ(error, 1801);
+  auto dc = spooler.CreateDC("Dock Zebra", error);
   ASSERT_TRUE(dc);
   ASSERT_TRUE(dc->StartDoc("Quendal.clsStarTrackGenericSCM"));
   for (int page = 0; page < 2; ++page) {
@@ -80,7 +82,6 @@ TEST_F(DirectorySpoolerTest, DrawnJobsArePngPagesAtThePrintersResolution) {
     dc->EndPage();
   }
   ASSERT_TRUE(dc->EndDoc());
-  long error = 0;
   const auto h = spooler.OpenPrinter("Dock Zebra", error);
   EXPECT_EQ(spooler.JobCount(h, 999), 2);
   const auto png = ReadFile((root / "Dock Zebra/000002-Quendal.clsStarTrackGenericSCM.png").string());

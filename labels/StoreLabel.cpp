@@ -2,6 +2,7 @@
 
 #include "frame/VB.h"
 #include "frame/host/Read.h"
+#include "labels/Gs1.h"
 
 namespace quendal {
 
@@ -11,6 +12,40 @@ using V = const LabelValues&;
 bool HasPanel(V v) { return !v.PanelText.empty(); }
 
 }  // namespace
+
+const std::array<BatchField, 31> kStoreLabelBatch = {{
+    {1, &LabelValues::FromName},
+    {2, &LabelValues::FromLine3},
+    {3, &LabelValues::FromState},
+    {4, &LabelValues::CarrierName},
+    {5, &LabelValues::ConNoteNo},
+    {6, &LabelValues::BillOfLading},
+    {7, &LabelValues::LocationCode},
+    {8, &LabelValues::LocationNumber},
+    {9, &LabelValues::ReceiverLine},
+    {10, &LabelValues::ReceiverPostcode},
+    {11, &LabelValues::ForName},
+    {12, &LabelValues::StoreText},
+    {13, &LabelValues::ForLine},
+    {14, &LabelValues::ForPostcode},
+    {15, [](V v) { return gs1::SsccText(v.SSCC); }},
+    {16, &LabelValues::PurchaseOrderLine},
+    {17, &LabelValues::PanelText},
+    {18, &LabelValues::ZoneDeptC},
+    {19, &LabelValues::StoreZoneDept},
+    {20, &LabelValues::ZoneDeptA},
+    {21, &LabelValues::ZoneDeptB},
+    {22, [](V v) { return gs1::ShipToReferenceData(v.CountryCode, v.ReceiverPostcode, v.StoreText); }},
+    {23, [](V v) { return gs1::ShipToReferenceText(v.CountryCode, v.ReceiverPostcode, v.StoreText); }},
+    {24, &LabelValues::PackedLine},
+    {25, &LabelValues::NotBeforeLine},
+    {26, &LabelValues::NotAfterLine},
+    {27, &LabelValues::UserText1},
+    {28, &LabelValues::UserText2},
+    {29, &LabelValues::SalesOrderLine},
+    {30, [](V v) { return gs1::SsccData(v.SSCC); }},
+    {31, [](V v) { return gs1::SsccText(v.SSCC); }},
+}};
 
 const std::array<zpl::Piece, 37> kStoreLabelZpl = {{
     {"^XA^MCY^XZ^XA^SZ2^MMT^MTT~JSN^LT0^MD0^MNY^PRA^PON^PMN^CI0^LRN"},

@@ -23,16 +23,16 @@ class TollMyerTest : public test::LabelFixture {
 TEST_F(TollMyerTest, MyerdcPutsTheStoreFirst) {
   const std::string format = label.PrintVPCLII();
   EXPECT_EQ(format.substr(0, 32), "{F,650,A,R,E,600,400,\"MYERDC\"|L,");
-  EXPECT_NE(format.find("|C,530,5,0,1,2,2,O,L,0,0,\"FOR:\"|T,7,4,V,515,60,0,3,2,2,B,L,0,0,0|"
-                        "T,8,30,V,530,170,0,1,1,2,B,L,0,0,0|"),
+  EXPECT_NE(format.find("|C,530,5,0,1,2,2,O,L,0,0,\"FOR:\"|T,12,4,V,515,60,0,3,2,2,B,L,0,0,0|"
+                        "T,11,30,V,530,170,0,1,1,2,B,L,0,0,0|"),
             std::string::npos);
   EXPECT_EQ(format.substr(format.size() - 36), "|T,31,22,V,22,60,0,1,2,1,B,L,0,0,0|}");
   EXPECT_EQ(Printed("VPCLII"),
             "{B,650,N,1|E,1,0,1,1,0,1|1,\"Acme Apparel Pty Ltd\"|2,\"DANDENONG SOUTH\"|3,\"VIC\"|"
-            "4,\"Southern Road E\"|5,\"SRX000123456\"|6,\"BOL7781-2024\"|7,\"0412\"|"
-            "8,\"HARBOUR STORES CHADSTONE\"|9,\"1 EXAMPLE PARAD\"|10,\"3148\"|11,\"MELBOURNE\"|"
-            "12,\"0900\"|13,\"HARBOUR STORES DC\"|14,\"3029\"|15,\"(00)093123450000000012\"|"
-            "16,\"PO PO778812\"|17,\"\"|18,\"12\"|19,\"A4-N\"|20,\"WOMENSWEAR AND \"|21,\"\"|"
+            "4,\"Southern Road E\"|5,\"SRX000123456\"|6,\"BOL7781-2024\"|7,\"MELBOURNE\"|"
+            "8,\"0900\"|9,\"HARBOUR STORES DC\"|10,\"3029\"|11,\"HARBOUR STORES CHADSTONE\"|"
+            "12,\"0412\"|13,\"1 EXAMPLE PARAD\"|14,\"3148\"|15,\"(00)093123450000000012\"|"
+            "16,\"PO PO778812\"|17,\"\"|18,\"WOMENSWEAR AND \"|19,\"\"|20,\"12\"|21,\"A4-N\"|"
             "22,\"~2014210363029~201900412\"|23,\"(421)0363029(90)0412\"|24,\"Date Packed 14/03/24\"|"
             "25,\"Not Before  15/03/24\"|26,\"Not After   20/03/24\"|27,\"\"|28,\"\"|29,\"SO SO10045\"|"
             "30,\"~20100093123450000000012\"|31,\"(00)093123450000000012\"|}");

@@ -196,9 +196,10 @@ TEST_F(CliTest, SeparatorPdtAndPackLineOnAnyLabelClass) {
 
   r = Run({"--json", "pdt", "clsTollMYERSCM", "--job", "1"});
   ASSERT_EQ(r.status, 0) << r.err;
-  ASSERT_EQ(r.Json()["lines"].size(), 3u);
-  for (const auto& line : r.Json()["lines"]) EXPECT_EQ(line["line"].get<std::string>().size(), 244u);
-  EXPECT_EQ(r.Json()["lines"][1]["line"].get<std::string>().substr(0, 45),
+  const json pdt = r.Json();
+  ASSERT_EQ(pdt["lines"].size(), 3u);
+  for (const auto& line : pdt["lines"]) EXPECT_EQ(line["line"].get<std::string>().size(), 244u);
+  EXPECT_EQ(pdt["lines"][1]["line"].get<std::string>().substr(0, 45),
             "556677 HBS0012         SO10045               ");
   ExpectOneLineError(Run({"pdt", "clsTollMYERSCM", "--job", "5"}), 1, "no job 5");
 

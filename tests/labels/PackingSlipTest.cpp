@@ -30,6 +30,11 @@ class PackingSlipTest : public test::LabelFixture {
     order->fields["SlipLines"] = MemoryHost::List<host::PSlipLine>({lines[0], lines[1], lines[2]});
     ASSERT_TRUE(label.Init(host.system));
   }
+  void TearDown() override {
+    // The order lists its lines and each line names its order: undo that.
+    order->fields.clear();
+    LabelFixture::TearDown();
+  }
   std::shared_ptr<MemoryObject<host::PSlipLine>> Line(int no, const char* apn, double qty, double packed,
                                                       std::shared_ptr<MemoryObject<host::Product>> product) {
     return host.Make<host::PSlipLine>(

@@ -7,6 +7,7 @@
 
 #include <cmath>
 #include <filesystem>
+#include <random>
 
 #include "labels/Separator.h"
 #include "labels/cMayneCMLSCM.h"
@@ -21,7 +22,7 @@ namespace {
 
 namespace fs = std::filesystem;
 
-class PreviewTest : public test::LabelFixture, public ::testing::WithParamInterface<int> {
+class PreviewFixture : public test::LabelFixture {
  protected:
   // The label of the fixture's carton as the class would send it: the
   // format its Init downloads, then the batch (or the ZPL label).
@@ -45,6 +46,8 @@ class PreviewTest : public test::LabelFixture, public ::testing::WithParamInterf
     return false;
   }
 };
+
+class PreviewTest : public PreviewFixture, public ::testing::WithParamInterface<int> {};
 
 TEST_P(PreviewTest, ReferenceLabelAsTheThermalPrinterPrintsIt) {
   clsStarTrackGenericSCM label;
@@ -118,6 +121,25 @@ TEST(PreviewJobs, BadJobsDrawWhatTheyCanAndNeverFail) {
   }
   EXPECT_EQ(printer.Print("hello").notes,
             std::vector<std::string>{"no VPCL II format or batch and no ZPL label in the job"});
+}
+
+TEST_F(PreviewFixture, DamagedJobsNeverFail) {
+  clsMayneCMLSCM label;
+  const std::string zpl = Job(label, true);
+  const std::string vpcl = label.PrintVPCLII() + label.VPCLIIBatchCommand();
+  // Bytes overwritten, cut short or repeated, the same way each run.
+  std::mt19937 random(15);
+  for (const std::string* job : {&zpl, &vpcl}) {
+    for (int round = 0; round < 40; ++round) {
+      std::string damaged = *job;
+      for (int i = 0; i < 8; ++i)
+        damaged[random() % damaged.size()] = static_cast<char>("^~{}|\",,9-\xff"[random() % 11]);
+      if (round % 4 == 0) damaged.resize(random() % damaged.size());
+      if (round % 4 == 1) damaged += damaged;
+      preview::Printer printer;
+      for (const auto& page : printer.Print(damaged).pages) EXPECT_FALSE(page.png.empty());
+    }
+  }
 }
 
 class SpoolerPreviewTest : public test::LabelFixture {};

@@ -43,6 +43,7 @@ std::string Fill(const Field& field, const Var& value) {
       return Format(Var(whole), std::string(static_cast<std::size_t>(field.width), '0'));
     }
     case Kind::Date:
+    case Kind::Number:
       return Clean(Format(value, field.text));
   }
   return {};

@@ -27,6 +27,7 @@ enum class Kind : std::uint8_t {
   CutLeft,    // the first `width` characters of the value, padded on the right
   Zero,       // the value as a whole number, zero-filled on the left to `width` digits
   Date,       // the value formatted with the mask; a missing date is empty
+  Number,     // the number formatted with the mask ("00000.000")
 };
 
 struct Field {
@@ -46,6 +47,10 @@ constexpr Field Zero(int width) { return {Kind::Zero, width, {}}; }
 // Masks whose output is as long as the mask ("YYYYMMDDHHMMSS", "DD-MMM-YYYY  ").
 constexpr Field Date(std::string_view mask) {
   return {Kind::Date, static_cast<int>(mask.size()), mask};
+}
+// Number masks of digits and a point; a whole part too long for the mask is written whole.
+constexpr Field Number(std::string_view mask) {
+  return {Kind::Number, static_cast<int>(mask.size()), mask};
 }
 
 constexpr bool TakesValue(const Field& field) {

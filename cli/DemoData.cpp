@@ -22,7 +22,7 @@ struct CarrierAccount {
 
 constexpr std::array kAccounts = {
     CarrierAccount{"StarTrack", "STE", "10023456", "#%ATL", "", "EXP"},
-    CarrierAccount{"TNT", "TNT", "30012345", "", "", "75"},
+    CarrierAccount{"TNT", "TNT", "30012345", "", "", "O/N 1ST CLASS"},
     CarrierAccount{"Mayne", "MAY", "20034567", "", "", "RD"},
     CarrierAccount{"Ipec", "IPE", "50045678", "", "", "ROAD"},
     CarrierAccount{"VicExpress", "VEX", "60056789", "", "", "MET"},
@@ -161,7 +161,7 @@ DemoData BuildDemoData(const std::string& root, DateTime now) {
     const Store& s = kStores[i];
     doc["Receivers"].push_back({{"ReceiverId", i + 1}, {"Code", s.code}, {"PartnerId", s.partner},
                                 {"StoreCode", s.code}, {"Name", s.name}, {"AddressLine1", s.line1},
-                                {"AddressLine2", nullptr}, {"Suburb", s.suburb}, {"City", s.city},
+                                {"AddressLine2", i < 2 ? "Gate 2" : "Rear loading dock"}, {"Suburb", s.suburb}, {"City", s.city},
                                 {"State", s.state}, {"Postcode", s.postcode}, {"CountryCode", "036"},
                                 {"CarrierId", static_cast<int>(i) % carrierCount + 1},
                                 {"CarrierServiceCode", i < 2 ? "EXP" : "STD"},

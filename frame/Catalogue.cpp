@@ -11,6 +11,9 @@ std::unique_ptr<Component> MakeTollMYERSCM();
 std::unique_ptr<Component> MakeeParcelManifestxml();
 std::unique_ptr<Component> MakeeParcelManifestEODxml();
 std::unique_ptr<Component> MakeStarTrackDAcln();
+std::unique_ptr<Component> MakeTNTDAet11();
+std::unique_ptr<Component> MakeVicExpressDAcln();
+std::unique_ptr<Component> MakeAlliedExpressSEDIP();
 
 namespace {
 
@@ -19,7 +22,7 @@ using enum Family;
 constexpr std::array kCatalogue = {
     CatalogueEntry{"clsStarTrackDAcln", Consignment, "StarTrack",
                    "CLN consignment file, dangerous goods declaration", MakeStarTrackDAcln},
-    CatalogueEntry{"clsTNTDAet11", Consignment, "TNT", "ET11 file", nullptr},
+    CatalogueEntry{"clsTNTDAet11", Consignment, "TNT", "ET11 file", MakeTNTDAet11},
     CatalogueEntry{"clsStarTrackCMLSCM", Label, "StarTrack", "CML", nullptr},
     CatalogueEntry{"clsTNTCMLSCM", Label, "TNT", "CML", nullptr},
     CatalogueEntry{"clsStarTrackDJsSCM", Label, "StarTrack", "David Jones", nullptr},
@@ -30,7 +33,7 @@ constexpr std::array kCatalogue = {
     CatalogueEntry{"clsStarTrackBLSCM", Label, "StarTrack", "BL", nullptr},
     CatalogueEntry{"clsIpecDA1256", Consignment, "Ipec", "1256 file", nullptr},
     CatalogueEntry{"clsVicExpressDAcln", Consignment, "VicExpress", "consignment file (\".CTN\")",
-                   nullptr},
+                   MakeVicExpressDAcln},
     CatalogueEntry{"clsVLODAcsv", Consignment, "VLO", "map-driven CSV file", nullptr},
     CatalogueEntry{"clsMayneCMLSCM", Label, "Mayne", "CML", MakeMayneCMLSCM},
     CatalogueEntry{"clsMayneGenericSCM", Label, "Mayne", "any retailer", nullptr},
@@ -50,7 +53,8 @@ constexpr std::array kCatalogue = {
     CatalogueEntry{"clsTollMYERSCM", Label, "Toll", "Myer", MakeTollMYERSCM},
     CatalogueEntry{"clsTNTTransactionDAcsv", Consignment, "TNT", "map-driven CSV transaction file",
                    nullptr},
-    CatalogueEntry{"clsAlliedExpressSEDIP", Consignment, "Allied Express", "SEDIP file", nullptr},
+    CatalogueEntry{"clsAlliedExpressSEDIP", Consignment, "Allied Express", "SEDIP file",
+                   MakeAlliedExpressSEDIP},
     CatalogueEntry{"clsStarTrackRebelSCM", Label, "StarTrack", "Rebel", nullptr},
     CatalogueEntry{"clsIFSAPISCM", Label, "IFS", "any retailer", nullptr},
     CatalogueEntry{"clsIFSDJsSCM", Label, "IFS", "David Jones", nullptr},

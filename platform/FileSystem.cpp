@@ -5,6 +5,7 @@
 #include <unistd.h>
 
 #include <algorithm>
+#include <cerrno>
 #include <cstdio>
 #include <ctime>
 #include <filesystem>
@@ -114,6 +115,54 @@ bool ReplaceFile(const std::string& path, std::string_view bytes) {
   return true;
 }
 
+std::optional<std::string> ReadFileHead(const std::string& path, std::size_t maxBytes) {
+  RandomAccessFile file;
+  if (!file.Open(path, RandomAccessFile::Mode::Existing)) return std::nullopt;
+  return file.Read(0, maxBytes);
+}
+
+bool SyncFolder(const std::string& folder) {
+  const int fd = ::open(folder.empty() ? "." : folder.c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC);
+  if (fd < 0) return false;
+  const bool ok = ::fsync(fd) == 0;
+  return ::close(fd) == 0 && ok;
+}
+
+NewFile WriteNewFile(const std::string& path, std::string_view bytes) {
+  const fs::path target(path);
+  const std::string folder = target.parent_path().string();
+  std::string tmpl = (target.parent_path() / ("." + target.filename().string() + ".XXXXXX")).string();
+  const int fd = ::mkstemp(tmpl.data());
+  if (fd < 0) return NewFile::Failed;
+  const bool written = WriteAll(fd, bytes) && ::fsync(fd) == 0 && ::fchmod(fd, 0644) == 0;
+  if (::close(fd) != 0 || !written) {
+    ::unlink(tmpl.c_str());
+    return NewFile::Failed;
+  }
+  // A hard link takes the name only when it is free, and the file appears whole.
+  if (::link(tmpl.c_str(), path.c_str()) == 0) {
+    ::unlink(tmpl.c_str());
+    SyncFolder(folder);
+    return NewFile::Written;
+  }
+  const int linkError = errno;
+  ::unlink(tmpl.c_str());
+  if (linkError == EEXIST) return NewFile::Exists;
+  if (linkError != EPERM && linkError != ENOTSUP && linkError != EOPNOTSUPP && linkError != EXDEV &&
+      linkError != EMLINK)
+    return NewFile::Failed;
+  // File systems without hard links: create the name exclusively and write
+  // into it; a failed write takes the file away again.
+  const int direct = ::open(path.c_str(), O_WRONLY | O_CREAT | O_EXCL | O_CLOEXEC, 0644);
+  if (direct < 0) return errno == EEXIST ? NewFile::Exists : NewFile::Failed;
+  const bool ok = WriteAll(direct, bytes) && ::fsync(direct) == 0;
+  if (::close(direct) != 0 || !ok) {
+    ::unlink(path.c_str());
+    return NewFile::Failed;
+  }
+  return NewFile::Written;
+}
+
 bool DeleteFile(const std::string& path) {
   std::error_code ec;
   return fs::remove(path, ec) && !ec;
@@ -166,6 +215,69 @@ bool AppendingFile::Append(std::string_view bytes) {
 }
 
 void AppendingFile::Close() {
+  if (fd_ >= 0) ::close(fd_);
+  fd_ = -1;
+}
+
+bool RandomAccessFile::Open(const std::string& path, Mode mode) {
+  Close();
+  int flags = O_RDWR | O_CLOEXEC;
+  if (mode != Mode::Existing) flags |= O_CREAT;
+  if (mode == Mode::CreateEmpty) flags |= O_TRUNC;
+  fd_ = ::open(path.c_str(), flags, 0644);
+  return fd_ >= 0;
+}
+
+std::optional<std::uint64_t> RandomAccessFile::Size() const {
+  struct stat st {};
+  if (fd_ < 0 || ::fstat(fd_, &st) != 0) return std::nullopt;
+  return static_cast<std::uint64_t>(st.st_size);
+}
+
+std::optional<FileStamp> RandomAccessFile::Stamp() const {
+  struct stat st {};
+  if (fd_ < 0 || ::fstat(fd_, &st) != 0) return std::nullopt;
+  return StampFrom(st);
+}
+
+std::optional<std::string> RandomAccessFile::Read(std::uint64_t offset, std::size_t length) const {
+  if (fd_ < 0) return std::nullopt;
+  std::string bytes(length, '\0');
+  std::size_t got = 0;
+  while (got < length) {
+    const ssize_t n = ::pread(fd_, bytes.data() + got, length - got, static_cast<off_t>(offset + got));
+    if (n < 0) {
+      if (errno == EINTR) continue;
+      return std::nullopt;
+    }
+    if (n == 0) break;
+    got += static_cast<std::size_t>(n);
+  }
+  bytes.resize(got);
+  return bytes;
+}
+
+bool RandomAccessFile::Cut(std::uint64_t length) {
+  return fd_ >= 0 && ::ftruncate(fd_, static_cast<off_t>(length)) == 0;
+}
+
+bool RandomAccessFile::WriteAt(std::uint64_t offset, std::string_view bytes) {
+  if (fd_ < 0) return false;
+  while (!bytes.empty()) {
+    const ssize_t n = ::pwrite(fd_, bytes.data(), bytes.size(), static_cast<off_t>(offset));
+    if (n < 0) {
+      if (errno == EINTR) continue;
+      return false;
+    }
+    bytes.remove_prefix(static_cast<std::size_t>(n));
+    offset += static_cast<std::uint64_t>(n);
+  }
+  return true;
+}
+
+bool RandomAccessFile::Sync() { return fd_ >= 0 && ::fdatasync(fd_) == 0; }
+
+void RandomAccessFile::Close() {
   if (fd_ >= 0) ::close(fd_);
   fd_ = -1;
 }

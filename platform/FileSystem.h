@@ -32,6 +32,16 @@ bool AppendFile(const std::string& path, std::string_view bytes);
 // so a failure never leaves a half-written file.
 bool ReplaceFile(const std::string& path, std::string_view bytes);
 bool DeleteFile(const std::string& path);
+// At most `maxBytes` bytes from the start of the file.
+std::optional<std::string> ReadFileHead(const std::string& path, std::size_t maxBytes);
+// Makes the folder's entries (files created, renamed or removed in it) durable.
+bool SyncFolder(const std::string& folder);
+
+// Writes a file that must not exist yet, so that it appears whole or not
+// at all: the bytes go to a hidden file beside it, which is then linked to
+// its name. Never replaces a file that exists.
+enum class NewFile { Written, Exists, Failed };
+NewFile WriteNewFile(const std::string& path, std::string_view bytes);
 std::optional<std::uintmax_t> FileSize(const std::string& path);
 
 // What tells one state of a file from another: its identity, size and
@@ -62,6 +72,37 @@ class AppendingFile {
   // the file is cut back to its length before the call, so a reader never
   // finds half of what was meant to go in together.
   bool Append(std::string_view bytes);
+  void Close();
+
+ private:
+  int fd_ = -1;
+};
+
+// A file opened for reading and writing in place, for replacing its end.
+class RandomAccessFile {
+ public:
+  enum class Mode {
+    Existing,         // the file must exist
+    CreateIfMissing,  // an empty file is created when missing
+    CreateEmpty,      // created, or emptied when it exists
+  };
+  RandomAccessFile() = default;
+  ~RandomAccessFile() { Close(); }
+  RandomAccessFile(const RandomAccessFile&) = delete;
+  RandomAccessFile& operator=(const RandomAccessFile&) = delete;
+
+  bool Open(const std::string& path, Mode mode);
+  bool IsOpen() const { return fd_ >= 0; }
+  std::optional<std::uint64_t> Size() const;
+  std::optional<FileStamp> Stamp() const;
+  // The bytes at `offset`; fewer when the file ends before `length`.
+  std::optional<std::string> Read(std::uint64_t offset, std::size_t length) const;
+  // Cuts the file to `length` bytes.
+  bool Cut(std::uint64_t length);
+  // Writes all bytes at `offset`.
+  bool WriteAt(std::uint64_t offset, std::string_view bytes);
+  // Makes the file's data and size durable (fdatasync).
+  bool Sync();
   void Close();
 
  private:

@@ -2,13 +2,12 @@
 
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
-#include <sys/resource.h>
 
-#include <csignal>
 #include <filesystem>
 
 #include "carrierfiles/FixedRecord.h"
 #include "platform/Clock.h"
+#include "tests/support/FileSizeLimit.h"
 #include "tests/support/MemoryHost.h"
 #include "tests/support/TempFolder.h"
 
@@ -17,6 +16,7 @@ namespace {
 
 namespace fs = std::filesystem;
 using test::MemoryHost;
+using test::FileSizeLimit;
 using ::testing::ElementsAre;
 
 // A consignment class that logs twice and then fails.
@@ -35,26 +35,6 @@ class Probe : public ConsignmentWriter {
     if (!proc([&] { throw Error(err::kDeviceIO); })) return;
     proc([&] { LogLine(0, "Process", "never"); });
   }
-};
-
-// Files larger than `bytes` can't be written while this lives.
-class FileSizeLimit {
- public:
-  explicit FileSizeLimit(rlim_t bytes) {
-    getrlimit(RLIMIT_FSIZE, &saved_);
-    previous_ = std::signal(SIGXFSZ, SIG_IGN);
-    rlimit limit = saved_;
-    limit.rlim_cur = bytes;
-    setrlimit(RLIMIT_FSIZE, &limit);
-  }
-  ~FileSizeLimit() {
-    setrlimit(RLIMIT_FSIZE, &saved_);
-    std::signal(SIGXFSZ, previous_);
-  }
-
- private:
-  rlimit saved_{};
-  void (*previous_)(int) = nullptr;
 };
 
 class ConsignmentWriterTest : public ::testing::Test {

@@ -6,6 +6,8 @@ namespace quendal {
 
 // Factories of the built classes, defined beside each class.
 std::unique_ptr<Component> MakeStarTrackGenericSCM();
+std::unique_ptr<Component> MakeMayneCMLSCM();
+std::unique_ptr<Component> MakeTollMYERSCM();
 std::unique_ptr<Component> MakeeParcelManifestxml();
 std::unique_ptr<Component> MakeeParcelManifestEODxml();
 std::unique_ptr<Component> MakeStarTrackDAcln();
@@ -35,7 +37,7 @@ constexpr std::array kCatalogue = {
     CatalogueEntry{"clsVicExpressDAcln", Consignment, "VicExpress", "consignment file (\".CTN\")",
                    MakeVicExpressDAcln},
     CatalogueEntry{"clsVLODAcsv", Consignment, "VLO", "map-driven CSV file", MakeVLODAcsv},
-    CatalogueEntry{"clsMayneCMLSCM", Label, "Mayne", "CML", nullptr},
+    CatalogueEntry{"clsMayneCMLSCM", Label, "Mayne", "CML", MakeMayneCMLSCM},
     CatalogueEntry{"clsMayneGenericSCM", Label, "Mayne", "any retailer", nullptr},
     CatalogueEntry{"clsStarTrackGenericSCM", Label, "StarTrack", "any retailer (reference class)",
                    MakeStarTrackGenericSCM},
@@ -50,7 +52,7 @@ constexpr std::array kCatalogue = {
     CatalogueEntry{"clsStarTrackBigWSCM", Label, "StarTrack", "BigW", nullptr},
     CatalogueEntry{"clsTollBigWSCM", Label, "Toll", "BigW", nullptr},
     CatalogueEntry{"clsStarTrackHSSCM", Label, "StarTrack", "HS", nullptr},
-    CatalogueEntry{"clsTollMYERSCM", Label, "Toll", "Myer", nullptr},
+    CatalogueEntry{"clsTollMYERSCM", Label, "Toll", "Myer", MakeTollMYERSCM},
     CatalogueEntry{"clsTNTTransactionDAcsv", Consignment, "TNT", "map-driven CSV transaction file",
                    MakeTNTTransactionDAcsv},
     CatalogueEntry{"clsAlliedExpressSEDIP", Consignment, "Allied Express", "SEDIP file",

@@ -9,6 +9,8 @@
 #include "cli/Work.h"
 #include "frame/Catalogue.h"
 #include "frame/VB.h"
+#include "labels/LabelPrinter.h"
+#include "labels/Preview.h"
 #include "mvserver/SqliteHost.h"
 #include "platform/Clock.h"
 #include "platform/DirectorySpooler.h"
@@ -21,6 +23,10 @@ namespace {
 
 // The ordinary printer of a carrier, on which the demo draws a label.
 std::string DrawnPrinter(const std::string& carrier) { return carrier + " Drawn"; }
+// The ZPL printer of a carrier whose label classes also speak ZPL.
+std::string ZplPrinter(const std::string& carrier) { return carrier + " ZPL"; }
+// Label printers of the demo: 203 dpi, with a picture beside each job.
+constexpr const char* kThermalPrinter = "dpi=203\npreview=yes\n";
 
 // Marks a folder the demo made, so a later run may replace what is in it.
 constexpr const char* kMarker = ".quendal-demo";
@@ -109,6 +115,7 @@ int RunDemo(const std::string& out, std::ostream& cout, bool asJson) {
   }
   for (const auto& carrier : data.carriers) {
     fs::create_directories(root / "spool" / SafeFileName(carrier.printer));
+    std::ofstream(root / "spool" / SafeFileName(carrier.printer) / "printer.ini") << kThermalPrinter;
     fs::create_directories(carrier.folder);
     // An ordinary printer per carrier, on which one label is drawn as a picture.
     const fs::path drawn = root / "spool" / SafeFileName(DrawnPrinter(carrier.name));
@@ -116,6 +123,11 @@ int RunDemo(const std::string& out, std::ostream& cout, bool asJson) {
     std::ofstream(drawn / "printer.ini") << "dpi=300\n";
   }
   fs::create_directories(root / "spool" / SafeFileName(data.documentPrinter));
+  for (const DemoFile& file : data.files) {
+    std::ofstream out(file.path, std::ios::binary);
+    out << file.text;
+    if (!out) throw OpenFailure("cannot write " + file.path);
+  }
 
   std::shared_ptr<mvserver::SqliteHost> host;
   try {
@@ -125,7 +137,9 @@ int RunDemo(const std::string& out, std::ostream& cout, bool asJson) {
   }
   host->Import(data.document.dump());
   auto previousLibrary = host::RegisterLibrary(host);
-  auto previousSpooler = SetSpooler(std::make_shared<DirectorySpooler>((root / "spool").string()));
+  auto spooler = std::make_shared<DirectorySpooler>((root / "spool").string());
+  spooler->SetPreviewer(preview::MakePreviewer);
+  auto previousSpooler = SetSpooler(spooler);
 
   // The consignments of each carrier, by the carrier's name.
   std::map<std::string, std::vector<Ref<host::ConNote>>> byCarrier;
@@ -161,6 +175,7 @@ int RunDemo(const std::string& out, std::ostream& cout, bool asJson) {
       if (!created.object) throw UsageError(created.reason);
       if (auto* labels = as<LabelInterface>(created.object)) {
         run["labels"] = json::array();
+        run["separators"] = json::array();
         // One Init per printer: the packs of each carrier go to that carrier's printer.
         std::map<std::string, std::vector<Ref<host::Pack>>> packsByPrinter;
         for (const auto& conNote : conNotes) {
@@ -171,6 +186,26 @@ int RunDemo(const std::string& out, std::ostream& cout, bool asJson) {
           const LabelRun labelRun = PrintLabels(*labels, system, printer, packs, std::nullopt);
           for (const auto& [pack, printed] : labelRun.labels)
             run["labels"].push_back({{"pack", pack}, {"printer", printer}, {"printed", printed}});
+          // A separator after the class's cartons, as between two stores.
+          run["separators"].push_back(
+              {{"printer", printer},
+               {"printed", labels->Separator(printer, "End of " + std::string(entry.className) + "\r\n" +
+                                                          std::to_string(packs.size()) + " cartons")}});
+        }
+        // The first label once more on a ZPL printer, for the classes that speak ZPL.
+        const auto* frame = dynamic_cast<const LabelPrinter*>(created.object.get());
+        if (frame && frame->SpeaksZpl() && !conNotes.empty() && conNotes.front()->Packs()->Count() > 0) {
+          Created zplObject = CreateObject(entry.Identifier());
+          if (auto* zpl = as<LabelInterface>(zplObject.object)) {
+            const std::string printer = ZplPrinter(carrier);
+            fs::create_directories(root / "spool" / SafeFileName(printer));
+            std::ofstream(root / "spool" / SafeFileName(printer) / "printer.ini") << kThermalPrinter;
+            const LabelRun labelRun =
+                PrintLabels(*zpl, OverrideSystem(system, "PrinterLanguage", Var("ZPL")), printer,
+                            {conNotes.front()->Packs()->Item(1)}, std::nullopt);
+            for (const auto& [pack, printed] : labelRun.labels)
+              run["labels"].push_back({{"pack", pack}, {"printer", printer}, {"printed", printed}, {"zpl", true}});
+          }
         }
         // The first of the carrier's labels once more, drawn on an ordinary printer as a PNG page.
         if (!conNotes.empty() && conNotes.front()->Packs()->Count() > 0) {

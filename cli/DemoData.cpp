@@ -86,6 +86,25 @@ constexpr int kPallet = 3, kSatchel = 4;
 
 constexpr int kConsignments = 30;
 
+// The columns a site lists for each map-driven despatch advice, one field
+// name per line as a Windows editor saves them.
+struct MapFile {
+  std::string_view carrier, name, text;
+};
+constexpr std::array kMapFiles = {
+    MapFile{"VLO", "VLODA.map",
+            "SHIPNOTENO\r\nSHIPNOTEDATE\r\nSHIPNOTETIME\r\nSHIPNOTESTATUS\r\nCONSIGNMENTNOTENO\r\n"
+            "ORDERNO\r\nORDERSTATUSCODE\r\nPARTNERSUPPLIERNO\r\nCARRIERNAME\r\nCARRIERACCOUNTREF\r\n"
+            "RECEIVERNAME\r\nRECEIVERADDR1\r\nRECEIVERTOWN\r\nRECEIVERSTATE\r\nRECEIVERPOSTCODE\r\n"
+            "SHIPTOCODE\r\nCONTAINERNO\r\nSHIPPACKCODE\r\nPACKAGETYPECODE\r\nPACKWEIGHT\r\n"
+            "SHIPMENTCOUNT\r\nSHIPMENTWEIGHT\r\n"},
+    MapFile{"TNT", "TransactionDA.map",
+            "SHIPNOTENO\r\nCONSIGNMENTNOTENO\r\nORDERNO\r\nDELREFERENCE\r\nCARRIERACCOUNTREF\r\n"
+            "CARRIERSERVICECODE\r\nSENDERNAME\r\nRECEIVERNAME\r\nRECEIVERADDR1\r\nRECEIVERTOWN\r\n"
+            "RECEIVERSTATE\r\nRECEIVERPOSTCODE\r\nRECEIVERPHONE\r\nSHIPMENTCOUNT\r\nSHIPMENTWEIGHT\r\n"
+            "SHIPMENTVOLUME\r\nDESCRIPTION\r\nSPECIALREFERENCE1\r\n"},
+};
+
 std::string Padded(std::int64_t value, int width) {
   std::string text = std::to_string(value);
   return std::string(text.size() < static_cast<std::size_t>(width) ? width - text.size() : 0, '0') + text;
@@ -153,6 +172,10 @@ DemoData BuildDemoData(const std::string& root, DateTime now) {
     services.emplace_back(account.service);
   }
   const auto carrierCount = static_cast<int>(names.size());
+  for (const DemoCarrier& carrier : data.carriers)
+    for (const MapFile& map : kMapFiles)
+      if (map.carrier == carrier.name)
+        data.files.push_back({carrier.folder + std::string(map.name), std::string(map.text)});
 
   doc["Partners"] = json::array({{{"PartnerId", 1}, {"Code", "HBS"}, {"ShortName", "HARBOUR"}, {"SupplierNo", "556677"}},
                                  {{"PartnerId", 2}, {"Code", "MDS"}, {"ShortName", "MERIDIAN"}, {"SupplierNo", "889900"}}});

@@ -22,10 +22,17 @@ struct DemoCarrier {
   std::string folder;   // its FileFolder, ending in "/"
 };
 
+// A file the demo lays down beside the data before it runs the classes.
+struct DemoFile {
+  std::string path;
+  std::string text;
+};
+
 struct DemoData {
   json document;
   std::vector<DemoCarrier> carriers;
   std::string documentPrinter;
+  std::vector<DemoFile> files;  // the map files of the map-driven despatch advice
 };
 
 // `root` is the demo folder (absolute); carrier folders lie under root/carriers/.

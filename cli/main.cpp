@@ -16,7 +16,9 @@
 #include "cli/Prompt.h"
 #include "cli/Work.h"
 #include "frame/VB.h"
+#include "labels/Preview.h"
 #include "mvserver/SqliteHost.h"
+#include "platform/FileSystem.h"
 #include "platform/Clock.h"
 #include "platform/CupsSpooler.h"
 #include "platform/DirectorySpooler.h"
@@ -51,10 +53,44 @@ struct Options {
   std::string carrier;
   std::string html;
   std::int16_t reportOption = 1;
+
+  std::string message;
+  std::int64_t job = 0;
+  std::string orderNo;
+  std::string apn;
+  std::int32_t line = 0;
+  std::vector<std::string> jobs;
+  std::string previewOut;
+  int dpi = 0;
 };
 
 // A run shows its progress on a terminal once it has more rows than this.
 constexpr std::size_t kProgressRows = 200;
+
+// What System.LastError tells after PackLineValid.
+std::string PackLineMeaning(int code) {
+  switch (code) {
+    case 0:
+      return "the article may be packed";
+    case 8101:
+      return "the packing slip could not be examined";
+    case 8102:
+      return "no line of the slip carries the article";
+    case 8103:
+      return "the quantity would exceed the article's lines";
+    case 8106:
+      return "the pack does not belong to the packing slip";
+    default:
+      return "unknown code";
+  }
+}
+
+// A message typed on the command line: a line break, or the two characters
+// \n, separates its lines, which the label classes receive as CR LF.
+std::string MessageLines(const std::string& text) {
+  std::string lines = Replace(Replace(text, "\\n", "\n"), "\r\n", "\n");
+  return Replace(lines, "\n", "\r\n");
+}
 
 class Command {
  public:
@@ -191,6 +227,127 @@ class Command {
              std::cout << "PrintLabel pack " << pack << ": " << (printed ? "True" : "False") << "\n";
            PrintLogs(std::cout, logs);
          });
+    return 0;
+  }
+
+  int Separator() {
+    const CatalogueEntry& entry = BuiltClass(o_.className, Family::Label);
+    const std::int64_t lastLog = Host().LastLogId();
+    LabelInterface* labels = nullptr;
+    auto object = Create(entry, labels);
+    // Init without a printer: the separator needs no label format on it.
+    const bool init = labels->Init(System());
+    const bool printed = labels->Separator(o_.printer, MessageLines(o_.message));
+    const auto logs = Host().LogsSince(lastLog);
+    Emit({{"class", entry.Identifier()}, {"printer", o_.printer}, {"init", init}, {"separator", printed},
+          {"log", LogsJson(logs)}},
+         [&] {
+           std::cout << entry.Identifier() << " Separator(\"" << o_.printer
+                     << "\"): " << (printed ? "True" : "False") << "\n";
+           PrintLogs(std::cout, logs);
+         });
+    return 0;
+  }
+
+  int Pdt() {
+    const CatalogueEntry& entry = BuiltClass(o_.className, Family::Label);
+    auto job = Host().Find<host::Job>("Job", o_.job);
+    if (!job) throw UsageError("no job " + std::to_string(o_.job) + " in " + o_.db);
+    const std::int64_t lastLog = Host().LastLogId();
+    LabelInterface* labels = nullptr;
+    auto object = Create(entry, labels);
+    const auto system = System();
+    labels->Init(system);
+    // Every order's packing slip, line by line.
+    json lines = json::array();
+    for (auto id : Host().Keys("Order")) {
+      const auto order = Host().Find<host::Order>("Order", id);
+      const Ref<host::SlipLines> slip = order->SlipLines();
+      for (auto line : *slip)
+        lines.push_back({{"order", VarJson(order->OrderNo())}, {"lineNo", VarJson(line->LineNo())},
+                         {"line", labels->PDTLookupLine(job, line)}});
+    }
+    const auto logs = Host().LogsSince(lastLog);
+    const std::string type = system->PDTType().Text();
+    Emit({{"class", entry.Identifier()}, {"job", o_.job}, {"pdtType", type},
+          {"fieldLengths", labels->PDTFieldLength()}, {"lines", lines}, {"log", LogsJson(logs)}},
+         [&] {
+           std::cout << entry.Identifier() << " PDTLookupLine, job " << o_.job << ", PDT type \"" << type
+                     << "\" (field widths " << labels->PDTFieldLength() << ")\n";
+           for (const auto& l : lines)
+             std::cout << "order " << (l["order"].is_string() ? l["order"].get<std::string>() : l["order"].dump())
+                       << " line " << l["lineNo"].dump() << ": \"" << l["line"].get<std::string>() << "\"\n";
+           PrintLogs(std::cout, logs);
+         });
+    return 0;
+  }
+
+  int PackLine() {
+    const CatalogueEntry& entry = BuiltClass(o_.className, Family::Label);
+    const std::int64_t lastLog = Host().LastLogId();
+    LabelInterface* labels = nullptr;
+    auto object = Create(entry, labels);
+    labels->Init(System());
+    std::int16_t error = 0;
+    const Var line = labels->PackLineValid(Var(o_.orderNo), Var(o_.packs.front()), Var(o_.apn),
+                                           o_.qty ? Var(o_.qty) : Var(), &error, o_.line);
+    const auto logs = Host().LogsSince(lastLog);
+    Emit({{"class", entry.Identifier()}, {"order", o_.orderNo}, {"pack", o_.packs.front()}, {"apn", o_.apn},
+          {"qty", o_.qty ? o_.qty : 1}, {"lineNo", VarJson(line)}, {"lastError", error},
+          {"meaning", PackLineMeaning(error)}, {"log", LogsJson(logs)}},
+         [&] {
+           std::cout << entry.Identifier() << " PackLineValid(order " << o_.orderNo << ", pack "
+                     << o_.packs.front() << ", APN " << o_.apn << ", qty " << (o_.qty ? o_.qty : 1)
+                     << "): line " << VarText(line) << ", LastError " << error << " ("
+                     << PackLineMeaning(error) << ")\n";
+           PrintLogs(std::cout, logs);
+         });
+    return 0;
+  }
+
+  int Preview() {
+    namespace fs = std::filesystem;
+    // The printer's resolution and label from the printer.ini beside the
+    // first job (a printer folder of the directory spooler), else 203 dpi
+    // and 4 x 6 inches.
+    preview::Settings settings;
+    const fs::path first = fs::absolute(o_.jobs.front());
+    if (FileExists((first.parent_path() / "printer.ini").string())) {
+      const DirectorySpooler folder(first.parent_path().parent_path().string());
+      const std::string name = first.parent_path().filename().string();
+      settings = {folder.Dpi(name), folder.PageWidthMm(name), folder.PageHeightMm(name)};
+    }
+    if (o_.dpi) settings.dpi = o_.dpi;
+    if (!o_.previewOut.empty() && !CreateFolder(o_.previewOut))
+      throw OpenFailure("cannot create " + o_.previewOut);
+    preview::Printer printer(settings);
+    json jobs = json::array();
+    for (const std::string& path : o_.jobs) {
+      const auto bytes = ReadFile(path);
+      if (!bytes) throw OpenFailure("cannot read " + path);
+      const preview::Result result = printer.Print(*bytes);
+      const fs::path job(path);
+      const fs::path folder = o_.previewOut.empty() ? job.parent_path() : fs::path(o_.previewOut);
+      json pages = json::array();
+      for (std::size_t i = 0; i < result.pages.size(); ++i) {
+        const std::string name = "preview-" + job.stem().string() +
+                                 (i == 0 ? std::string() : "-" + std::to_string(i + 1)) + ".png";
+        const std::string out = (folder / name).string();
+        if (!ReplaceFile(out, result.pages[i].png)) throw OpenFailure("cannot write " + out);
+        pages.push_back({{"file", out}, {"width", result.pages[i].width}, {"height", result.pages[i].height}});
+      }
+      jobs.push_back({{"job", path}, {"pages", pages}, {"notes", result.notes}});
+    }
+    Emit({{"dpi", settings.dpi}, {"jobs", jobs}}, [&] {
+      for (const auto& j : jobs) {
+        std::cout << j["job"].get<std::string>() << ": " << j["pages"].size() << " label"
+                  << (j["pages"].size() == 1 ? "" : "s") << " at " << settings.dpi << " dpi\n";
+        for (const auto& page : j["pages"])
+          std::cout << "  " << page["file"].get<std::string>() << " (" << page["width"] << " x "
+                    << page["height"] << " pixels)\n";
+        for (const auto& note : j["notes"]) std::cout << "  note: " << note.get<std::string>() << "\n";
+      }
+    });
     return 0;
   }
 
@@ -354,6 +511,32 @@ int Main(int argc, char** argv) {
   label->add_option("--qty", o.qty, "copies")->check(CLI::Range(1, 32767));
   label->add_option("--language", o.language, "overrides System.PrinterLanguage for this command");
 
+  auto* separator = app.add_subcommand("separator", "Init, then Separator: a separator label between groups of cartons");
+  separator->add_option("CLASS", o.className, "label class")->required();
+  separator->add_option("--printer", o.printer, "printer name")->required();
+  separator->add_option("--message", o.message,
+                        "up to five lines; a line break or the two characters \\n separate them")
+      ->required();
+  separator->add_option("--language", o.language, "overrides System.PrinterLanguage for this command");
+
+  auto* pdt = app.add_subcommand("pdt", "PDTLookupLine of every packing-slip line, for a job");
+  pdt->add_option("CLASS", o.className, "label class")->required();
+  pdt->add_option("--job", o.job, "job id")->required();
+
+  auto* packline = app.add_subcommand("packline", "PackLineValid: may the article go into the pack?");
+  packline->add_option("CLASS", o.className, "label class")->required();
+  packline->add_option("--order", o.orderNo, "order number (the packing slip)")->required();
+  packline->add_option("--pack", o.packs, "pack id")->required()->expected(1);
+  packline->add_option("--apn", o.apn, "the scanned article number")->required();
+  packline->add_option("--qty", o.qty, "quantity to pack (default 1)")->check(CLI::Range(1, 32767));
+  packline->add_option("--line", o.line, "only this slip line");
+
+  auto* preview = app.add_subcommand("preview", "draw printer jobs (VPCL II, ZPL) as the label printer prints them, as PNG");
+  preview->add_option("JOB", o.jobs, "job files, in the order the printer received them")->required();
+  preview->add_option("--out", o.previewOut, "folder for the pictures (default: beside each job)");
+  preview->add_option("--dpi", o.dpi, "the printer's resolution (default: its printer.ini, else 203)")
+      ->check(CLI::Range(50, 2400));
+
   auto* despatch = app.add_subcommand("despatch", "Process(System, ConNote, ASN of its first pack, its packs)");
   despatch->add_option("CLASS", o.className, "consignment class")->required();
   despatch->add_option("--connote", o.conNote, "consignment id")->required();
@@ -424,8 +607,11 @@ int Main(int argc, char** argv) {
     SetErrorPrompt(MakePrompt(o.onError, std::cin, std::cerr, isatty(STDIN_FILENO) != 0));
     if (o.cups)
       SetSpooler(std::make_shared<CupsSpooler>());
-    else
-      SetSpooler(std::make_shared<DirectorySpooler>(o.spool));
+    else {
+      auto spooler = std::make_shared<DirectorySpooler>(o.spool);
+      spooler->SetPreviewer(preview::MakePreviewer);
+      SetSpooler(spooler);
+    }
 
     Command command(o);
     if (*classes) return command.Classes();
@@ -433,6 +619,10 @@ int Main(int argc, char** argv) {
     if (*log) return command.Log();
     if (*settings) return command.Settings(set->parsed());
     if (*label) return command.Label();
+    if (*separator) return command.Separator();
+    if (*pdt) return command.Pdt();
+    if (*packline) return command.PackLine();
+    if (*preview) return command.Preview();
     if (*despatch) return command.Despatch();
     if (*manifest) return command.Manifest();
     if (*report) return command.Report();

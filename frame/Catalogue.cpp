@@ -6,6 +6,8 @@ namespace quendal {
 
 // Factories of the built classes, defined beside each class.
 std::unique_ptr<Component> MakeStarTrackGenericSCM();
+std::unique_ptr<Component> MakeMayneCMLSCM();
+std::unique_ptr<Component> MakeTollMYERSCM();
 std::unique_ptr<Component> MakeeParcelManifestxml();
 std::unique_ptr<Component> MakeeParcelManifestEODxml();
 std::unique_ptr<Component> MakeStarTrackDAcln();
@@ -14,6 +16,8 @@ std::unique_ptr<Component> MakeStarTrackEODcln();
 std::unique_ptr<Component> MakeTNTDAet11();
 std::unique_ptr<Component> MakeVicExpressDAcln();
 std::unique_ptr<Component> MakeAlliedExpressSEDIP();
+std::unique_ptr<Component> MakeVLODAcsv();
+std::unique_ptr<Component> MakeTNTTransactionDAcsv();
 
 namespace {
 
@@ -34,8 +38,8 @@ constexpr std::array kCatalogue = {
     CatalogueEntry{"clsIpecDA1256", Consignment, "Ipec", "1256 file", nullptr},
     CatalogueEntry{"clsVicExpressDAcln", Consignment, "VicExpress", "consignment file (\".CTN\")",
                    MakeVicExpressDAcln},
-    CatalogueEntry{"clsVLODAcsv", Consignment, "VLO", "map-driven CSV file", nullptr},
-    CatalogueEntry{"clsMayneCMLSCM", Label, "Mayne", "CML", nullptr},
+    CatalogueEntry{"clsVLODAcsv", Consignment, "VLO", "map-driven CSV file", MakeVLODAcsv},
+    CatalogueEntry{"clsMayneCMLSCM", Label, "Mayne", "CML", MakeMayneCMLSCM},
     CatalogueEntry{"clsMayneGenericSCM", Label, "Mayne", "any retailer", nullptr},
     CatalogueEntry{"clsStarTrackGenericSCM", Label, "StarTrack", "any retailer (reference class)",
                    MakeStarTrackGenericSCM},
@@ -50,9 +54,9 @@ constexpr std::array kCatalogue = {
     CatalogueEntry{"clsStarTrackBigWSCM", Label, "StarTrack", "BigW", nullptr},
     CatalogueEntry{"clsTollBigWSCM", Label, "Toll", "BigW", nullptr},
     CatalogueEntry{"clsStarTrackHSSCM", Label, "StarTrack", "HS", nullptr},
-    CatalogueEntry{"clsTollMYERSCM", Label, "Toll", "Myer", nullptr},
+    CatalogueEntry{"clsTollMYERSCM", Label, "Toll", "Myer", MakeTollMYERSCM},
     CatalogueEntry{"clsTNTTransactionDAcsv", Consignment, "TNT", "map-driven CSV transaction file",
-                   nullptr},
+                   MakeTNTTransactionDAcsv},
     CatalogueEntry{"clsAlliedExpressSEDIP", Consignment, "Allied Express", "SEDIP file",
                    MakeAlliedExpressSEDIP},
     CatalogueEntry{"clsStarTrackRebelSCM", Label, "StarTrack", "Rebel", nullptr},

@@ -91,6 +91,38 @@ class LabelInterface : public virtual Component {
   virtual std::int32_t SpooledJobCount(std::int32_t aPrinterHandle) = 0;
   // Draws the last label on the drawn printer opened for it ("WinPCL").
   virtual void PrintWinPCL() = 0;
+
+  // Prints a separator label between groups of cartons (a new store, item
+  // or location) on the named printer: up to five lines of the message,
+  // whose lines are separated by line breaks. False when the printer does
+  // not open.
+  virtual bool Separator(const std::string& aPrinterId, const std::string& aMessage) = 0;
+  // The line a portable data terminal loads for one packing-slip line of a
+  // job, in the form System.PDTType names; empty for an unknown type.
+  virtual std::string PDTLookupLine(const Ref<host::Job>& aJob,
+                                    const Ref<host::PSlipLine>& aPSlipLine) = 0;
+  // Whether aQty (Null: 1) of the scanned article aAPN may be packed into
+  // aPack (a Pack, a pack id, or Null for any pack) from the packing slip
+  // aPSlip (an Order, or an order number). System.LastError tells why not:
+  // 8101 the slip could not be examined, 8106 the pack is not of that
+  // order, 8102 no line carries the article, 8103 every such line is full,
+  // 0 it may be packed; aError receives it too. A non-zero aLineId limits
+  // the match to that line. Returns the matching PSlipLine (Null when none)
+  // for an Order, the line's LineNo (0 when none) for an order number.
+  virtual Var PackLineValid(const Var& aPSlip, const Var& aPack, const Var& aAPN,
+                            const Var& aQty = Var(), std::int16_t* aError = nullptr,
+                            std::int32_t aLineId = 0) = 0;
+};
+
+// Label classes that print a whole pack list as one job, with separators.
+class PackListInterface : public virtual Component {
+ public:
+  // The separator's format and batch as text, for inclusion in a longer job.
+  virtual std::string RatioSeparator(const std::string& aMessage) = 0;
+  // The label of every pack of the list in one job, in list order or
+  // sorted by style, with a separator before each new order when wanted.
+  virtual bool PrintAllLabels(const Ref<host::PackList>& aPackList, bool bSeperator,
+                              bool bStyleSort) = 0;
 };
 
 // Members shared by consignment and row classes.

@@ -22,7 +22,12 @@ void ComponentBase::WriteLog(long errorNumber, std::string_view procedure,
       }))
     return;
   if (!proc([&] { log->SetLogDate(Now()); })) return;
-  if (!proc([&] { log->SetUserName(system_->UserName()); })) return;
+  // An object asked to log before it was given a System (a consignment
+  // class's OpenMapFile or Load) still logs, without a user name.
+  if (!proc([&] {
+        if (system_) log->SetUserName(system_->UserName());
+      }))
+    return;
   if (!proc([&] {
         if (auto name = ComputerName()) log->SetComputerName(*name);
       }))

@@ -4,7 +4,6 @@
 #include <chrono>
 #include <cstdint>
 #include <cstring>
-#include <functional>
 #include <thread>
 
 #include "frame/Error.h"
@@ -23,6 +22,7 @@ namespace {
 
 constexpr std::string_view kWinPCL = "WinPCL";
 constexpr std::string_view kVPCLII = "VPCLII";
+constexpr std::string_view kZPL = "ZPL";
 // A queue this long counts as full: the next job waits until it drops.
 constexpr std::int32_t kQueueFull = 999;
 // Between two looks at a full queue: long enough not to busy the processor,
@@ -68,25 +68,24 @@ void LabelPrinter::SetStoreZoneDept(const std::string& value) {
   Guard("Property (Let) StoreZoneDept")([&] { storeZoneDept_ = Left(value, 30); });
 }
 
-std::string LabelPrinter::PDTFieldLength() const { return "7,6,10,22,20,13,20,13,20,20,10,6,6,1,16,6"; }
-
 bool LabelPrinter::IsDrawn() const { return system_->PrinterLanguage().Text() == kWinPCL; }
 
-bool LabelPrinter::DownloadsFormat(const std::string& language) const { return language != kWinPCL; }
+bool LabelPrinter::DownloadsFormat(const std::string& language) const {
+  return language != kWinPCL && !(language == kZPL && SpeaksZpl());
+}
 
-bool LabelPrinter::WriteOtherLanguage(const std::string&) { return false; }
+bool LabelPrinter::WriteOtherLanguage(const std::string& language) {
+  if (language != kZPL || !SpeaksZpl()) return false;
+  if (handle_ != 0) WriteChannel(PrintZPL());
+  return true;
+}
 
-// Abandons the channel when the procedure holding it ends early.
-class ChannelScope {
- public:
-  explicit ChannelScope(std::function<void()> abandon) : abandon_(std::move(abandon)) {}
-  ~ChannelScope() { abandon_(); }
-  ChannelScope(const ChannelScope&) = delete;
-  ChannelScope& operator=(const ChannelScope&) = delete;
-
- private:
-  std::function<void()> abandon_;
-};
+std::string LabelPrinter::PrintZPL() {
+  std::string result;
+  Procedure proc = Guard("Function PrintZPL");
+  proc([&] { result = zpl::Render(layout_.zpl, values_); });
+  return result;
+}
 
 bool LabelPrinter::Init(const Ref<host::System>& system, const std::string& aPrinter) {
   bool result = false;
@@ -112,7 +111,7 @@ bool LabelPrinter::Init(const Ref<host::System>& system, const std::string& aPri
 
   std::string format;
   if (!proc([&] { format = PrintVPCLII(); })) return result;
-  ChannelScope scope([this] { AbandonChannel(); });
+  ChannelScope scope(*this);
   bool opened = false;
   if (!proc([&] { opened = OpenPtr(); }) || !opened) return result;
   if (!proc([&] { WriteChannel(format); })) return result;
@@ -132,7 +131,7 @@ bool LabelPrinter::PrintLabel(const Ref<host::Pack>& aPack, std::optional<std::i
     return result;
   if (!printing) return result;
 
-  ChannelScope scope([this] { AbandonChannel(); });
+  ChannelScope scope(*this);
   if (!proc([&] { pack_ = aPack; })) return result;
   if (!proc([&] { copies_ = Qty.value_or(1); })) return result;
   // Sent directly by the host: no job; the values stay for VPCLIIBatchCommand.

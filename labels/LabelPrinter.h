@@ -19,50 +19,11 @@
 
 #include "frame/ComponentBase.h"
 #include "platform/DeviceContext.h"
+#include "labels/LabelValues.h"
 #include "labels/Vpcl.h"
+#include "labels/Zpl.h"
 
 namespace quendal {
-
-// The values of one carton label, read from the host for one pack. Texts
-// are cut to the widths the layouts leave them; a Null host value reads as
-// the empty text.
-struct LabelValues {
-  bool AuthorityToLeave = false;
-  std::string FromName;
-  std::string FromLine2;
-  std::string FromLine3;
-  std::string FromState;
-  std::string LabelCarrierId;
-  std::string CarrierName;
-  std::string ConNoteNo;
-  std::string ServiceLine;
-  std::string PostcodeServiceLine;
-  std::string ToNameShort;
-  std::string ToName;
-  std::string ToAddress1;
-  std::string ToAddress2;
-  std::string ToSuburb;
-  std::string ToState;
-  std::string ToPostcode;
-  std::string ToSuburbUpper;
-  std::string CountryCode;
-  std::string SSCC;
-  std::string OrderLine;
-  std::string SalesOrderLine;
-  std::string NotBeforeLine;
-  std::string NotAfterLine;
-  std::string PackedLine;
-  // Position of the pack in its consignment and its authority-to-leave
-  // number; only authority-to-leave labels renew them.
-  std::int16_t PackOrdinal = 0;
-  std::string ATLNumber;
-  std::string UserText1;
-  std::string UserText2;
-  std::string StoreZoneDept;
-  // The large store reference some layouts print top right; empty unless a
-  // class fills it.
-  std::string StoreText;
-};
 
 // One field of a batch: its number, its data (a value as it stands, or
 // built from the values), and when it is sent (always when `sent` is null).
@@ -87,6 +48,9 @@ struct LabelLayout {
   std::string_view formatNumber;  // "430"
   vpcl::Format format;
   std::span<const BatchField> batch;
+  // The class's ZPL label, for the classes that also drive ZPL printers:
+  // they print it for the language "ZPL" and download no format for it.
+  zpl::Stream zpl{};
 };
 
 class LabelPrinter : public virtual LabelInterface, public ComponentBase {
@@ -122,6 +86,16 @@ class LabelPrinter : public virtual LabelInterface, public ComponentBase {
   std::int32_t SpooledJobCount(std::int32_t aPrinterHandle) override;
   // Draws the last label's format and batch on the open drawn printer.
   void PrintWinPCL() override;
+  bool Separator(const std::string& aPrinterId, const std::string& aMessage) override;
+  std::string PDTLookupLine(const Ref<host::Job>& aJob,
+                            const Ref<host::PSlipLine>& aPSlipLine) override;
+  Var PackLineValid(const Var& aPSlip, const Var& aPack, const Var& aAPN, const Var& aQty = Var(),
+                    std::int16_t* aError = nullptr, std::int32_t aLineId = 0) override;
+
+  // The ZPL label for the last label's values (one copy, whatever the copy
+  // count); empty for a class that does not speak ZPL.
+  std::string PrintZPL();
+  bool SpeaksZpl() const { return !layout_.zpl.empty(); }
 
   // The values of the last label, and its copy count.
   const LabelValues& Values() const { return values_; }
@@ -143,8 +117,27 @@ class LabelPrinter : public virtual LabelInterface, public ComponentBase {
   // Whether Init downloads the format for this printer language.
   virtual bool DownloadsFormat(const std::string& language) const;
   // Writes the label in a language other than "WinPCL" and "VPCLII" to the
-  // open channel; false when the class does not speak it.
+  // open channel ("ZPL" for a class with a ZPL label); false when the class
+  // does not speak it.
   virtual bool WriteOtherLanguage(const std::string& language);
+
+  // Gives up the channel when the procedure holding it ends early (or has
+  // nothing to print), so that no half-written or empty job is queued.
+  class ChannelScope {
+   public:
+    explicit ChannelScope(LabelPrinter& printer) : printer_(printer) {}
+    ~ChannelScope() { printer_.AbandonChannel(); }
+    ChannelScope(const ChannelScope&) = delete;
+    ChannelScope& operator=(const ChannelScope&) = delete;
+
+   private:
+    LabelPrinter& printer_;
+  };
+  // Drops a job left open, so that no printer stays open.
+  void AbandonChannel();
+  // True while a job is open on a printer (raw or drawn).
+  bool ChannelOpen() const { return handle_ != 0 || dc_ != nullptr; }
+  bool RawChannelOpen() const { return handle_ != 0; }
 
   // The printer channel: one job per call, opened and closed inside it.
   bool OpenPtr();
@@ -175,9 +168,6 @@ class LabelPrinter : public virtual LabelInterface, public ComponentBase {
   std::string componentStyle_;
 
  private:
-  // Drops a job left open by a procedure that ended early, so that no
-  // half-written label is queued and no printer stays open.
-  void AbandonChannel();
   bool IsDrawn() const;
 
   const LabelLayout& layout_;
@@ -195,6 +185,19 @@ class LabelPrinter : public virtual LabelInterface, public ComponentBase {
   std::unique_ptr<DeviceContext> dc_;
   float twipsPerPixelX_ = 0;
   float twipsPerPixelY_ = 0;
+};
+
+// A label class that also prints a whole pack list as one job, with
+// separators between orders (and styles): the frame's RatioSeparator and
+// PrintAllLabels, offered to the host.
+class PackListLabelPrinter : public LabelPrinter, public PackListInterface {
+ public:
+  std::string RatioSeparator(const std::string& aMessage) override;
+  bool PrintAllLabels(const Ref<host::PackList>& aPackList, bool bSeperator,
+                      bool bStyleSort) override;
+
+ protected:
+  using LabelPrinter::LabelPrinter;
 };
 
 }  // namespace quendal

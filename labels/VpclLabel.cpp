@@ -81,6 +81,7 @@ VpclLabel ReadVpclLabel(std::string_view format, std::string_view batch) {
       label.length = Number(params, 5);
       label.width = Number(params, 6);
       label.name = Param(params, 7);
+      label.storage = Param(params, 4);
       continue;
     }
     VpclElement element{Param(params, 0), params, {}};

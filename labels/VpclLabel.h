@@ -19,6 +19,7 @@ struct VpclElement {
 
 struct VpclLabel {
   std::string name;
+  std::string storage;  // the header's letter after "A,R" ("E" on most formats)
   double length = 0;  // header length and width in VPCL units
   double width = 0;
   std::vector<VpclElement> elements;

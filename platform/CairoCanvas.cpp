@@ -11,6 +11,7 @@
 #include <csetjmp>
 #include <vector>
 #include <cmath>
+#include <numbers>
 #include <stdexcept>
 
 namespace quendal {
@@ -163,11 +164,10 @@ void CairoCanvas::Rectangle(int x1, int y1, int x2, int y2, int penWidth) {
   cairo_fill(cr_);
 }
 
-void CairoCanvas::Text(int x, int y, std::string_view utf8, const CanvasFont& font, Colour text,
-                       Colour background) {
-  if (!cr_ || utf8.empty() || font.height <= 0) return;
+PangoLayout* CairoCanvas::Layout(std::string_view utf8, const CanvasFont& font, double& stretch) {
+  if (!cr_ || utf8.empty() || font.height <= 0) return nullptr;
   const double em = font.height / kCellPerEm;
-  const double stretch = font.width > 0 ? font.width / (kAverageWidthPerEm * em) : 1.0;
+  stretch = font.width > 0 ? font.width / (kAverageWidthPerEm * em) : 1.0;
   PangoLayout* layout = pango_cairo_create_layout(cr_);
   PangoFontDescription* desc = pango_font_description_new();
   pango_font_description_set_family(desc, font.face.c_str());
@@ -181,19 +181,75 @@ void CairoCanvas::Text(int x, int y, std::string_view utf8, const CanvasFont& fo
   while (!g_utf8_validate(valid.data(), static_cast<gssize>(valid.size()), &end))
     valid[static_cast<std::size_t>(end - valid.data())] = '?';
   pango_layout_set_text(layout, valid.data(), static_cast<int>(valid.size()));
+  return layout;
+}
+
+void CairoCanvas::Text(int x, int y, std::string_view utf8, const CanvasFont& font, Colour text,
+                       Colour background) {
+  TurnedText(x, y, utf8, font, 0, text, background);
+}
+
+double CairoCanvas::TextWidth(std::string_view utf8, const CanvasFont& font) {
+  double stretch = 1;
+  PangoLayout* layout = Layout(utf8, font, stretch);
+  if (!layout) return 0;
   PangoRectangle logical;
   pango_layout_get_pixel_extents(layout, nullptr, &logical);
+  g_object_unref(layout);
+  return logical.width * stretch;
+}
+
+CanvasBox CairoCanvas::TurnedText(double x, double y, std::string_view utf8, const CanvasFont& font,
+                                  int quarterTurns, Colour text, std::optional<Colour> background,
+                                  bool invert) {
+  double stretch = 1;
+  PangoLayout* layout = Layout(utf8, font, stretch);
+  if (!layout) return {x, y, x, y};
+  PangoRectangle logical;
+  pango_layout_get_pixel_extents(layout, nullptr, &logical);
+  // The cell is as tall as the font's cell, whatever Pango's line height says.
+  const double cellWidth = logical.width;
+  const double cellHeight = std::max(logical.height, font.height);
+  const int turns = ((quarterTurns % 4) + 4) % 4;
   cairo_save(cr_);
   cairo_translate(cr_, x, y);
+  if (turns) cairo_rotate(cr_, turns * std::numbers::pi / 2);
   cairo_scale(cr_, stretch, 1.0);
-  // The cell is as tall as the font's cell, whatever Pango's line height says.
-  SetColour(background);
-  cairo_rectangle(cr_, 0, 0, logical.width, std::max(logical.height, font.height));
-  cairo_fill(cr_);
-  SetColour(text);
+  if (background) {
+    SetColour(*background);
+    cairo_rectangle(cr_, 0, 0, cellWidth, cellHeight);
+    cairo_fill(cr_);
+  }
+  if (invert) {
+    // Exclusive-or of coverage: ink where there was none, none where there was.
+    cairo_set_operator(cr_, CAIRO_OPERATOR_XOR);
+    cairo_set_source_rgba(cr_, 0, 0, 0, 1.0);
+  } else {
+    SetColour(text);
+  }
   pango_cairo_show_layout(cr_, layout);
   cairo_restore(cr_);
   g_object_unref(layout);
+  // The cell's corners on the page.
+  const double w = cellWidth * stretch;
+  const double h = cellHeight;
+  switch (turns) {
+    case 1:
+      return {x - h, y, x, y + w};
+    case 2:
+      return {x - w, y - h, x, y};
+    case 3:
+      return {x, y - w, x + h, y};
+    default:
+      return {x, y, x + w, y + h};
+  }
+}
+
+void CairoCanvas::Fill(double x1, double y1, double x2, double y2) {
+  if (!cr_ || x2 <= x1 || y2 <= y1) return;
+  SetColour(kBlack);
+  cairo_rectangle(cr_, x1, y1, x2 - x1, y2 - y1);
+  cairo_fill(cr_);
 }
 
 PngCanvas::PngCanvas(int widthPixels, int heightPixels, int dpi)

@@ -4,6 +4,7 @@
 #pragma once
 
 #include <memory>
+#include <optional>
 #include <string>
 #include <vector>
 
@@ -11,8 +12,14 @@
 
 typedef struct _cairo cairo_t;
 typedef struct _cairo_surface cairo_surface_t;
+typedef struct _PangoLayout PangoLayout;
 
 namespace quendal {
+
+// A rectangle on the page in pixels, right and bottom edges exclusive.
+struct CanvasBox {
+  double x1 = 0, y1 = 0, x2 = 0, y2 = 0;
+};
 
 class CairoCanvas : public Canvas {
  public:
@@ -20,6 +27,18 @@ class CairoCanvas : public Canvas {
   void Rectangle(int x1, int y1, int x2, int y2, int penWidth) override;
   void Text(int x, int y, std::string_view utf8, const CanvasFont& font, Colour text,
             Colour background) override;
+
+  // A filled black rectangle (x1, y1)-(x2, y2), right and bottom edges exclusive.
+  void Fill(double x1, double y1, double x2, double y2);
+  // The width in pixels of a text in a font, as the text routines draw it.
+  double TextWidth(std::string_view utf8, const CanvasFont& font);
+  // A text turned by quarter turns clockwise about (x, y), the top-left
+  // corner of its cell. With a background the cell is filled first; with
+  // `invert` the text reverses what lies beneath it (black turns white and
+  // white black) and its colour is not used. Returns the cell on the page.
+  CanvasBox TurnedText(double x, double y, std::string_view utf8, const CanvasFont& font,
+                       int quarterTurns, Colour text, std::optional<Colour> background,
+                       bool invert = false);
 
   int WidthPixels() const { return width_; }
   int HeightPixels() const { return height_; }
@@ -32,6 +51,9 @@ class CairoCanvas : public Canvas {
   void Finish();
   // Ink for a colour: A1 surfaces paint black and clear to white.
   void SetColour(Colour colour);
+  // The text laid out in the font, and the horizontal stretch that gives
+  // the font's character width; null without a page. The caller unrefs it.
+  PangoLayout* Layout(std::string_view utf8, const CanvasFont& font, double& stretch);
 
   cairo_t* cr_ = nullptr;
   cairo_surface_t* surface_ = nullptr;

@@ -48,26 +48,27 @@ std::string DirectorySpooler::PrinterFolder(const std::string& name) const {
   return (fs::path(root_) / SafeFileName(name)).string();
 }
 
-double DirectorySpooler::Setting(const std::string& name, std::string_view key, double fallback,
-                                 double low, double high) const {
+std::string DirectorySpooler::TextSetting(const std::string& name, std::string_view key) const {
   const auto ini = ReadFile((fs::path(PrinterFolder(name)) / "printer.ini").string());
-  if (!ini) return fallback;
+  if (!ini) return {};
   const std::string prefix = std::string(key) + "=";
   std::size_t pos = 0;
   while (pos < ini->size()) {
     std::size_t end = ini->find('\n', pos);
     if (end == std::string::npos) end = ini->size();
     const std::string line = Trim(Replace(ini->substr(pos, end - pos), "\r", ""));
-    if (line.starts_with(prefix)) {
-      const std::string value = Trim(line.substr(prefix.size()));
-      if (IsNumericText(value)) {
-        const double v = std::strtod(value.c_str(), nullptr);
-        if (v >= low && v <= high) return v;
-      }
-    }
+    if (line.starts_with(prefix)) return Trim(line.substr(prefix.size()));
     pos = end + 1;
   }
-  return fallback;
+  return {};
+}
+
+double DirectorySpooler::Setting(const std::string& name, std::string_view key, double fallback,
+                                 double low, double high) const {
+  const std::string value = TextSetting(name, key);
+  if (!IsNumericText(value)) return fallback;
+  const double v = std::strtod(value.c_str(), nullptr);
+  return v >= low && v <= high ? v : fallback;
 }
 
 int DirectorySpooler::Dpi(const std::string& name) const {
@@ -141,10 +142,32 @@ bool DirectorySpooler::EndDoc(std::int32_t handle) {
     extension = "pdf";
   }
   // The job appears whole: written beside the queue, then renamed into it.
-  const bool ok = ReplaceFile(NextJobPath(doc.printer, name, extension), doc.bytes);
+  const std::string path = NextJobPath(doc.printer, name, extension);
+  const bool ok = ReplaceFile(path, doc.bytes);
+  if (ok && extension == "prn") WritePreview(doc.printer, path, doc.bytes);
   doc.document.clear();
   doc.bytes.clear();
   return ok;
+}
+
+void DirectorySpooler::WritePreview(const std::string& printer, const std::string& jobPath,
+                                    std::string_view bytes) {
+  if (!previewerFactory_ || LCase(TextSetting(printer, "preview")) != "yes") return;
+  // A picture is a convenience: whatever goes wrong with it, the job stands.
+  try {
+    auto& previewer = previewers_[printer];
+    if (!previewer)
+      previewer = previewerFactory_(Dpi(printer), PageWidthMm(printer), PageHeightMm(printer));
+    if (!previewer) return;
+    const std::vector<std::string> pages = previewer->Pages(bytes);
+    const fs::path job(jobPath);
+    const std::string stem = "preview-" + job.stem().string();
+    for (std::size_t i = 0; i < pages.size(); ++i) {
+      const std::string suffix = i == 0 ? std::string() : "-" + std::to_string(i + 1);
+      ReplaceFile((job.parent_path() / (stem + suffix + ".png")).string(), pages[i]);
+    }
+  } catch (const std::exception&) {
+  }
 }
 
 void DirectorySpooler::ClosePrinter(std::int32_t handle) { open_.erase(handle); }

@@ -3,15 +3,34 @@
 // SPOOL/NAME/NNNNNN-<document name>.prn holding the bytes as sent (a
 // document named "*.pdf" is a PDF job: NNNNNN-<name>.pdf); the
 // queue length is the number of job files. SPOOL/NAME/printer.ini may set
-// dpi= (default 300).
+// dpi= (default 300), and preview=yes to have a picture of what each raw
+// job prints written beside it (preview-NNNNNN-<document name>.png, then
+// -2, -3 ... for the job's further labels), when a previewer is installed.
 #pragma once
 
+#include <functional>
 #include <map>
+#include <memory>
 #include <string>
+#include <string_view>
+#include <vector>
 
 #include "platform/Spooler.h"
 
 namespace quendal {
+
+// Draws what a printer prints for raw jobs, one PNG page per label. It may
+// keep what earlier jobs sent it, as a printer keeps stored formats.
+class JobPreviewer {
+ public:
+  virtual ~JobPreviewer() = default;
+  virtual std::vector<std::string> Pages(std::string_view job) = 0;
+};
+
+// Makes the previewer of one printer: its resolution and the page of a
+// label that sets no size of its own, in millimetres.
+using JobPreviewerFactory =
+    std::function<std::unique_ptr<JobPreviewer>(int dpi, double widthMm, double heightMm)>;
 
 class DirectorySpooler : public Spooler {
  public:
@@ -25,6 +44,10 @@ class DirectorySpooler : public Spooler {
   std::int32_t JobCount(std::int32_t handle, std::int32_t limit) override;
   std::vector<InstalledPrinter> InstalledPrinters() override;
   std::unique_ptr<DeviceContext> CreateDC(const std::string& printer, long& error) override;
+
+  // Installs what draws the previews of the printers whose printer.ini says
+  // preview=yes (none by default).
+  void SetPreviewer(JobPreviewerFactory factory) { previewerFactory_ = std::move(factory); }
 
   const std::string& Root() const { return root_; }
   // The folder of a printer.
@@ -43,6 +66,10 @@ class DirectorySpooler : public Spooler {
   // A number from printer.ini within [low, high], else `fallback`.
   double Setting(const std::string& name, std::string_view key, double fallback, double low,
                  double high) const;
+  // A text from printer.ini, trimmed; empty when not set.
+  std::string TextSetting(const std::string& name, std::string_view key) const;
+  // Writes the pictures of a raw job beside it when its printer asks for them.
+  void WritePreview(const std::string& printer, const std::string& jobPath, std::string_view bytes);
   struct Open {
     std::string printer;
     std::string document;  // empty when no document is started
@@ -53,6 +80,8 @@ class DirectorySpooler : public Spooler {
   std::map<std::int32_t, Open> open_;
   std::int32_t nextHandle_ = 1;
   std::int32_t jobSerial_ = 0;
+  JobPreviewerFactory previewerFactory_;
+  std::map<std::string, std::unique_ptr<JobPreviewer>> previewers_;  // by printer
 };
 
 // A file name made safe: path separators, "..", control characters and

@@ -176,6 +176,63 @@ TEST_F(CliTest, WorkCommandsRunBuiltClassesAndPrintWhatTheyReturned) {
   }
 }
 
+TEST_F(CliTest, SeparatorPdtAndPackLineOnAnyLabelClass) {
+  ASSERT_EQ(Run({"import", Example()}).status, 0);
+  std::filesystem::create_directories(folder / "spool/Dock 3");
+  // The two characters \n separate the message's lines.
+  Result r = Run({"--json", "separator", "clsStarTrackGenericSCM", "--printer", "Dock 3", "--message",
+                  "Store 0412\\nChadstone"});
+  ASSERT_EQ(r.status, 0) << r.err;
+  EXPECT_EQ(r.Json()["separator"], true);
+  const std::string job = test::ReadText(folder / "spool/Dock 3/000001-Quendal.clsStarTrackGenericSCM.prn");
+  EXPECT_NE(job.find("C,580,150,0,3,2,2,B,L,0,3,\"STORE 0412\"|C,580,110,0,1,2,2,B,L,0,3,\"CHADSTONE\"|"),
+            std::string::npos)
+      << job;
+  // --language: a ZPL printer gets no separator; a printer that is not there, none either.
+  r = Run({"--json", "separator", "clsMayneCMLSCM", "--printer", "Dock 3", "--message", "x", "--language", "ZPL"});
+  EXPECT_EQ(r.Json()["separator"], true);
+  EXPECT_FALSE(std::filesystem::exists(folder / "spool/Dock 3/000002-Quendal.clsMayneCMLSCM.prn"));
+  r = Run({"--json", "separator", "clsMayneCMLSCM", "--printer", "Dock 9", "--message", "x"});
+  EXPECT_EQ(r.Json()["separator"], false);
+  EXPECT_EQ(r.Json()["log"][0]["Message"], "Error 1801Unable to open printer Dock 9");
+
+  r = Run({"--json", "pdt", "clsTollMYERSCM", "--job", "1"});
+  ASSERT_EQ(r.status, 0) << r.err;
+  const json pdt = r.Json();
+  ASSERT_EQ(pdt["lines"].size(), 3u);
+  for (const auto& line : pdt["lines"]) EXPECT_EQ(line["line"].get<std::string>().size(), 244u);
+  EXPECT_EQ(pdt["lines"][1]["line"].get<std::string>().substr(0, 45),
+            "556677 HBS0012         SO10045               ");
+  ExpectOneLineError(Run({"pdt", "clsTollMYERSCM", "--job", "5"}), 1, "no job 5");
+
+  r = Run({"--json", "packline", "clsStarTrackGenericSCM", "--order", "SO10045", "--pack", "1001", "--apn",
+           "9312345000029", "--qty", "2"});
+  ASSERT_EQ(r.status, 0) << r.err;
+  EXPECT_EQ(r.Json()["lineNo"], 2);
+  EXPECT_EQ(r.Json()["lastError"], 0);
+  r = Run({"--json", "packline", "clsStarTrackGenericSCM", "--order", "SO10045", "--pack", "1003", "--apn",
+           "9312345000029"});
+  EXPECT_EQ(r.Json()["lineNo"], 0);
+  EXPECT_EQ(r.Json()["lastError"], 8106);
+}
+
+TEST_F(CliTest, PreviewDrawsJobsAsTheLabelPrinterPrintsThem) {
+  ASSERT_EQ(Run({"import", Example()}).status, 0);
+  std::filesystem::create_directories(folder / "spool/Zebra");
+  test::WriteText(folder / "spool/Zebra/printer.ini", "dpi=203\npreview=yes\n");
+  ASSERT_EQ(Run({"label", "clsMayneCMLSCM", "--pack", "1001", "--printer", "Zebra", "--language", "ZPL"}).status, 0);
+  // The spooler drew the job beside it, as printer.ini asks.
+  EXPECT_TRUE(std::filesystem::exists(folder / "spool/Zebra/preview-000001-Quendal.clsMayneCMLSCM.png"));
+  const Result r = Run({"--json", "preview", "spool/Zebra/000001-Quendal.clsMayneCMLSCM.prn", "--out", "pictures",
+                        "--dpi", "300"});
+  ASSERT_EQ(r.status, 0) << r.err;
+  ASSERT_EQ(r.Json()["jobs"][0]["pages"].size(), 1u);
+  // The printer's label, 100 mm wide, at 300 dpi.
+  EXPECT_EQ(r.Json()["jobs"][0]["pages"][0]["width"], 1181);
+  EXPECT_TRUE(std::filesystem::exists(folder / "pictures/preview-000001-Quendal.clsMayneCMLSCM.png"));
+  ExpectOneLineError(Run({"preview", "missing.prn"}), 2, "cannot read missing.prn");
+}
+
 // --cups prints through the private CUPS server that scripts/test starts; the
 // queue's device is a file, which receives the label batch.
 TEST_F(CliTest, LabelsThroughCups) {

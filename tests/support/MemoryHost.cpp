@@ -162,6 +162,22 @@ MemoryHost::MemoryHost() : self_(std::shared_ptr<host::Library>(this, [](host::L
     }
     return Var(list);
   };
+  // The packs of the pack's order among those made so far (a pack without
+  // an order has none), and the packs of a consignment.
+  system->methods["OrderPackCount"] = [this](std::span<const Var> args) {
+    const auto pack = args.empty() ? nullptr : args[0].Object();
+    if (!pack) throw Error(err::kObjectRequired);
+    const auto order = pack->Get("Order").Object();
+    std::int32_t count = 0;
+    for (const auto& p : packs) count += order && p->Get("Order").Object() == order ? 1 : 0;
+    return Var(count);
+  };
+  system->methods["ConNotePackCount"] = [](std::span<const Var> args) {
+    const auto conNote = args.empty() ? nullptr : args[0].Object();
+    if (!conNote) throw Error(err::kObjectRequired);
+    const auto list = host::Object::As<host::PackList>(conNote->Get("Packs"));
+    return Var(list ? list->Count() : 0);
+  };
   previous_ = host::RegisterLibrary(self_);
 }
 

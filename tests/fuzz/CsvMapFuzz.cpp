@@ -1,0 +1,82 @@
+// libFuzzer target: any map file must read without crashing, looping or
+// reading out of bounds; every column must name a catalogue field or none;
+// what the reader says about the file must be a short printable text; and a
+// line laid out from the map must read back as one value per column,
+// whatever the value holds.
+#include <algorithm>
+#include <array>
+#include <cstddef>
+#include <cstdint>
+#include <cstdlib>
+#include <string>
+#include <string_view>
+#include <vector>
+
+#include "carrierfiles/CsvMap.h"
+
+namespace {
+
+constexpr std::array<std::string_view, 6> kCatalogue = {
+    "CONSIGNMENTNOTENO", "CONTAINERNO", "PACKWEIGHT", "RECEIVERNAME", "SHIPNOTESTATUS", "A"};
+
+void Check(bool condition) {
+  if (!condition) std::abort();
+}
+
+// Reads a comma-separated line back into its values (double quotes group,
+// a doubled quote inside them stands for one).
+std::vector<std::string> ReadLine(std::string_view line) {
+  std::vector<std::string> values(1);
+  bool quoted = false;
+  for (std::size_t i = 0; i < line.size(); ++i) {
+    const char c = line[i];
+    if (quoted && c == '"' && i + 1 < line.size() && line[i + 1] == '"') {
+      values.back() += '"';
+      ++i;
+    } else if (c == '"' && (quoted || values.back().empty())) {
+      quoted = !quoted;
+    } else if (c == ',' && !quoted) {
+      values.emplace_back();
+    } else {
+      values.back() += c;
+    }
+  }
+  Check(!quoted);
+  return values;
+}
+
+}  // namespace
+
+extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
+  if (size == 0) return 0;
+  // The first byte gives the length of a value taken from the end of the
+  // input (0: a value with a comma, quotes and a line break), written in
+  // every column that names a field; the bytes between are the map file.
+  const std::string_view input(reinterpret_cast<const char*>(data) + 1, size - 1);
+  const std::size_t length = std::min<std::size_t>(data[0] % 17, input.size());
+  const std::string_view bytes = input.substr(0, input.size() - length);
+  const std::string_view value =
+      length == 0 ? std::string_view("a,\"b\"\r\n") : input.substr(input.size() - length);
+
+  const quendal::CsvMap map = quendal::ReadCsvMap(bytes, kCatalogue);
+  for (const std::ptrdiff_t column : map.columns)
+    Check(column == quendal::kNoField ||
+          (column >= 0 && static_cast<std::size_t>(column) < kCatalogue.size()));
+  Check(map.notes.size() <= 11);
+  for (const std::string& note : map.notes) {
+    Check(note.size() < 200);
+    for (const char c : note) Check(c >= 0x20 && c < 0x7F);
+  }
+
+  if (map.columns.empty()) return 0;
+  std::string line;
+  for (std::size_t i = 0; i < map.columns.size(); ++i) {
+    if (i > 0) line += ',';
+    quendal::AppendCsvValue(line, map.columns[i] == quendal::kNoField ? std::string_view() : value);
+  }
+  const std::vector<std::string> values = ReadLine(line);
+  Check(values.size() == map.columns.size());
+  for (std::size_t i = 0; i < values.size(); ++i)
+    Check(values[i] == (map.columns[i] == quendal::kNoField ? std::string_view() : value));
+  return 0;
+}

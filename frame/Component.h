@@ -125,6 +125,14 @@ class PackListInterface : public virtual Component {
                               bool bStyleSort) = 0;
 };
 
+// A label class that also prints a format and batch the host hands over as text.
+class PrintFileInterface : public virtual Component {
+ public:
+  // Sends the format as it is (drawn printers draw format and batch
+  // instead), then the batch; false when nothing reached a printer.
+  virtual bool PrintFile(const std::string& aFormat, const std::string& aBatch) = 0;
+};
+
 // Members shared by consignment and row classes.
 class LifecycleInterface {
  public:

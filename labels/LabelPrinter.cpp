@@ -290,12 +290,48 @@ void LabelPrinter::WriteChannel(std::string_view text) {
 
 void LabelPrinter::PrintWinPCL() {
   Procedure proc = Guard("Sub PrintWinPCL");
-  LabelDrawing drawing;
-  if (!proc([&] { drawing = LayOutLabel(ReadVpclLabel(PrintVPCLII(), VPCLIIBatchCommand())); }))
+  std::string format;
+  std::string batch;
+  if (!proc([&] {
+        format = PrintVPCLII();
+        batch = VPCLIIBatchCommand();
+      }))
     return;
-  proc([&] {
-    if (dc_) DrawLabel(*dc_, twipsPerPixelX_, twipsPerPixelY_, drawing);
-  });
+  proc([&] { DrawOnChannel(format, batch); });
+}
+
+void LabelPrinter::DrawOnChannel(std::string_view format, std::string_view batch) {
+  if (!dc_) return;
+  DrawLabel(*dc_, twipsPerPixelX_, twipsPerPixelY_, LayOutLabel(ReadVpclLabel(format, batch)));
+}
+
+bool PrintFileLabelPrinter::PrintFile(const std::string& aFormat, const std::string& aBatch) {
+  bool result = false;
+  Procedure proc = Guard("Function PrintFile");
+  std::string language;
+  if (!proc([&] { language = system_->PrinterLanguage().Text(); })) return result;
+  ChannelScope scope(*this);
+  bool opened = false;
+  if (!proc([&] { opened = OpenPtr(); }) || !opened) return result;
+  // A printer that did not open has been logged; what was handed over is
+  // not printed, and the host is told so.
+  if (!ChannelOpen()) return result;
+  if (!proc([&] {
+        if (language != kWinPCL && RawChannelOpen()) WriteChannel(aFormat);
+      }))
+    return result;
+  if (!proc([&] {
+        if (language == kWinPCL) {
+          DrawOnChannel(aFormat, aBatch);
+        } else if (language == kVPCLII) {
+          if (RawChannelOpen()) WriteChannel(aBatch);
+        } else {
+          WriteLog(0, "WriteLabel", language + " unknown.");
+        }
+      }))
+    return result;
+  if (!proc([&] { ClosePtr(); })) return result;
+  return result = true;
 }
 
 bool LabelPrinter::WriteLabel() {

@@ -139,6 +139,10 @@ class LabelPrinter : public virtual LabelInterface, public ComponentBase {
   bool ChannelOpen() const { return handle_ != 0 || dc_ != nullptr; }
   bool RawChannelOpen() const { return handle_ != 0; }
 
+  // Draws a VPCL II format and batch on the open drawn printer (nothing
+  // when no drawn printer is open), under the calling procedure's guard.
+  void DrawOnChannel(std::string_view format, std::string_view batch);
+
   // The printer channel: one job per call, opened and closed inside it.
   bool OpenPtr();
   void ClosePtr();
@@ -185,6 +189,16 @@ class LabelPrinter : public virtual LabelInterface, public ComponentBase {
   std::unique_ptr<DeviceContext> dc_;
   float twipsPerPixelX_ = 0;
   float twipsPerPixelY_ = 0;
+};
+
+// A label class that also prints a format and batch given as text: the
+// format is sent as it stands, then the batch, or both are drawn.
+class PrintFileLabelPrinter : public LabelPrinter, public PrintFileInterface {
+ public:
+  bool PrintFile(const std::string& aFormat, const std::string& aBatch) override;
+
+ protected:
+  using LabelPrinter::LabelPrinter;
 };
 
 // A label class that also prints a whole pack list as one job, with

@@ -18,6 +18,8 @@ std::unique_ptr<Component> MakeVicExpressDAcln();
 std::unique_ptr<Component> MakeAlliedExpressSEDIP();
 std::unique_ptr<Component> MakeVLODAcsv();
 std::unique_ptr<Component> MakeTNTTransactionDAcsv();
+std::unique_ptr<Component> MakeDFEDAxml();
+std::unique_ptr<Component> MakeDFEDAManifestxml();
 
 namespace {
 
@@ -47,7 +49,7 @@ constexpr std::array kCatalogue = {
     CatalogueEntry{"clsAaEGenericSCM", Label, "AaE", "any retailer", nullptr},
     CatalogueEntry{"clsAaEES610", Rows, "AaE", "ES610 file", nullptr},
     CatalogueEntry{"clsDFEDAxml", Consignment, "DFE",
-                   "XML despatch advice, dangerous goods declaration", nullptr},
+                   "XML despatch advice, dangerous goods declaration", MakeDFEDAxml},
     CatalogueEntry{"clsDFESCM", Label, "DFE", "any retailer", nullptr},
     CatalogueEntry{"clsHunterDA", Consignment, "Hunter", "despatch file", nullptr},
     CatalogueEntry{"clsHunterGenericSCM", Label, "Hunter", "any retailer", nullptr},
@@ -73,7 +75,8 @@ constexpr std::array kCatalogue = {
     CatalogueEntry{"clsStarTrackManifestcln", Rows, "StarTrack",
                    "manifest CLN, consolidated manifest, dangerous goods", MakeStarTrackManifestcln},
     CatalogueEntry{"clsDFEDAManifestxml", Rows, "DFE",
-                   "manifest XML, consolidated manifest, dangerous goods", nullptr},
+                   "manifest XML, consolidated manifest, dangerous goods",
+                   MakeDFEDAManifestxml},
     CatalogueEntry{"clsIpecDA1250Manifest", Rows, "Ipec", "1250 manifest, consolidated manifest",
                    nullptr},
     CatalogueEntry{"clsStarTrackEODcln", Rows, "StarTrack",

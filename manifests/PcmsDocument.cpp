@@ -71,39 +71,6 @@ std::string CreatedTime(const Var& conNoteDate) {
 
 namespace {
 
-constexpr std::string_view kReplacement = "\xEF\xBF\xBD";
-
-// Length of the well-formed UTF-8 sequence at the start of `s` that XML
-// allows (0 when malformed or not an XML character).
-std::size_t XmlCharLength(std::string_view s) {
-  const auto b0 = static_cast<unsigned char>(s[0]);
-  std::size_t length;
-  char32_t code;
-  if (b0 < 0x80) return 1;
-  if (b0 >= 0xC2 && b0 <= 0xDF) {
-    length = 2;
-    code = b0 & 0x1F;
-  } else if (b0 >= 0xE0 && b0 <= 0xEF) {
-    length = 3;
-    code = b0 & 0x0F;
-  } else if (b0 >= 0xF0 && b0 <= 0xF4) {
-    length = 4;
-    code = b0 & 0x07;
-  } else {
-    return 0;
-  }
-  if (s.size() < length) return 0;
-  for (std::size_t i = 1; i < length; ++i) {
-    const auto b = static_cast<unsigned char>(s[i]);
-    if ((b & 0xC0) != 0x80) return 0;
-    code = (code << 6) | (b & 0x3F);
-  }
-  const bool overlong = (length == 3 && code < 0x800) || (length == 4 && code < 0x10000);
-  const bool surrogate = code >= 0xD800 && code <= 0xDFFF;
-  if (overlong || surrogate || code > 0x10FFFF || code == 0xFFFE || code == 0xFFFF) return 0;
-  return length;
-}
-
 std::string_view LocalName(pugi::xml_node node) {
   std::string_view name = node.name();
   const std::size_t colon = name.find(':');
@@ -117,24 +84,6 @@ pugi::xml_node FindChild(pugi::xml_node parent, std::string_view local) {
   return {};
 }
 
-// Collects the serialised tree with every line ended by CR LF.
-class CrLfWriter : public pugi::xml_writer {
- public:
-  explicit CrLfWriter(std::string& out) : out_(out) {}
-  void write(const void* data, std::size_t size) override {
-    std::string_view bytes(static_cast<const char*>(data), size);
-    for (std::size_t at; (at = bytes.find('\n')) != std::string_view::npos;) {
-      out_.append(bytes.substr(0, at));
-      out_.append("\r\n");
-      bytes.remove_prefix(at + 1);
-    }
-    out_.append(bytes);
-  }
-
- private:
-  std::string& out_;
-};
-
 void Store(const std::string& path, const std::string& bytes) {
   if (ReplaceFile(path, bytes)) return;
   const fs::path folder = fs::path(path).parent_path();
@@ -142,38 +91,7 @@ void Store(const std::string& path, const std::string& bytes) {
                                                               : err::kPathNotFound);
 }
 
-std::string Beside(const std::string& path, int n) {
-  const fs::path p(path);
-  return (p.parent_path() / (p.stem().string() + "_" + std::to_string(n) + p.extension().string()))
-      .string();
-}
-
 }  // namespace
-
-std::string XmlText(std::string_view text) {
-  std::string out;
-  out.reserve(text.size());
-  while (!text.empty()) {
-    const std::size_t length = XmlCharLength(text);
-    if (length == 0) {
-      out.append(kReplacement);
-      text.remove_prefix(1);
-      continue;
-    }
-    if (length == 1 && static_cast<unsigned char>(text[0]) < 0x20)
-      out.push_back(' ');
-    else
-      out.append(text.substr(0, length));
-    text.remove_prefix(length);
-  }
-  return out;
-}
-
-pugi::xml_node AppendText(pugi::xml_node parent, const char* name, std::string_view text) {
-  pugi::xml_node node = parent.append_child(name);
-  node.text().set(XmlText(text).c_str());
-  return node;
-}
 
 Document::Document() : xml_(std::make_unique<pugi::xml_document>()) {
   root_ = xml_->append_child("SendPCMSManifest");
@@ -245,9 +163,7 @@ std::string Document::FileText() const {
   out += "<?xml version=\"1.0\" encoding=\"utf-8\"?>\r\n<PCMS xmlns=\"";
   out += kNamespace;
   out += "\">\r\n";
-  CrLfWriter writer(out);
-  root_.print(writer, "  ", pugi::format_indent | pugi::format_no_empty_element_tags,
-              pugi::encoding_utf8);
+  xml::AppendIndented(out, root_);
   out += "</PCMS>\r\n";
   return out;
 }
@@ -256,7 +172,7 @@ DayFileWritten WriteDayFile(const std::string& path, const Document& run) {
   DayFileWritten written;
   constexpr int kMaxBeside = 999;
   for (int n = 1; n <= kMaxBeside; ++n) {
-    const std::string candidate = n == 1 ? path : Beside(path, n);
+    const std::string candidate = n == 1 ? path : PathBeside(path, n);
     std::error_code ec;
     if (!fs::exists(candidate, ec) && !ec) {
       Store(candidate, run.FileText());

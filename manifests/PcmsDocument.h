@@ -17,6 +17,7 @@
 #include <vector>
 
 #include "frame/Var.h"
+#include "manifests/XmlWriting.h"
 
 namespace quendal::pcms {
 
@@ -42,12 +43,8 @@ std::string Dimension(const Var& metres);
 std::string TransactionTime(const DateTime& at);
 // The consignment date as "yyyy-mm-ddThh:mm:ss.106+10:00".
 std::string CreatedTime(const Var& conNoteDate);
-// Text fit for an element: control characters become spaces, malformed
-// UTF-8 becomes U+FFFD, so the file always stays well-formed.
-std::string XmlText(std::string_view text);
-
-// Appends an element with text to `parent` and returns it.
-pugi::xml_node AppendText(pugi::xml_node parent, const char* name, std::string_view text);
+using xml::AppendText;
+using xml::XmlText;
 
 class Document {
  public:

@@ -119,6 +119,17 @@ void RowWriter::FillRow(Grid& rows, std::size_t row, const Ref<host::ConNote>& c
   for (std::size_t c = 4; c < columns_.size() && c < rowColumns_; ++c) rows(row, c) = Var("");
 }
 
+void RowWriter::FillManifestRow(Grid& rows, std::size_t row, const Ref<host::ConNote>& conNote) {
+  RowWriter::FillRow(rows, row, conNote);
+  rows(row, 4) = conNote->ConNoteDate();
+  rows(row, 5) = conNote->ScheduledDate();
+}
+
+void RowWriter::LogLine(long errorNumber, std::string_view procedure, std::string_view message) {
+  WriteLog(errorNumber, procedure, message);
+  if (rowLog_) rowLog_->push_back(LastLogId());
+}
+
 std::int32_t RowWriter::Process(std::int32_t a_lRowNum, LogList& vtErrorLog) {
   std::int32_t result = 0;
   Procedure proc = Guard("Function Process");
@@ -137,6 +148,11 @@ std::int32_t RowWriter::Process(std::int32_t a_lRowNum, LogList& vtErrorLog) {
         return true;
       }))
     return result;
+  rowLog_ = &vtErrorLog;
+  struct Done {
+    LogList*& log;
+    ~Done() { log = nullptr; }
+  } done{rowLog_};
   result = ProcessRow(proc, conNote, vtErrorLog);
   return result;
 }

@@ -39,6 +39,19 @@ inline constexpr std::array<GridColumn, 5> kConsignmentColumns = {{
     {"Result", 0, 3000},
 }};
 
+// The grid of manifest runs: the consignment's number, partner, delivery
+// location, service and run code, when it was shipped and is scheduled,
+// and the row's result.
+inline constexpr std::array<GridColumn, 7> kManifestColumns = {{
+    {"ConNote No", 0, 2200},
+    {"Partner", 2, 2000},
+    {"Delivery Locn", 0, 2000},
+    {"Service-Run Code", 0, 2000},
+    {"Shipped Date", 0, 2600},
+    {"Sheduled Date", 0, 2600},
+    {"Result", 0, 3000},
+}};
+
 class RowWriter : public virtual RowInterface, public Lifecycle {
  public:
   bool Init(const Ref<host::System>& system, std::int16_t EDIDocId, Grid& Columns) override;
@@ -56,6 +69,9 @@ class RowWriter : public virtual RowInterface, public Lifecycle {
   // Fills row `row` of the row table for the consignment. The default shows
   // number, partner, delivery location and service; the other cells stay empty text.
   virtual void FillRow(Grid& rows, std::size_t row, const Ref<host::ConNote>& conNote);
+  // The row of the manifest grid (kManifestColumns): FillRow's cells, then
+  // the shipped and scheduled dates.
+  void FillManifestRow(Grid& rows, std::size_t row, const Ref<host::ConNote>& conNote);
   // The work of one chosen row, as further steps of the Process procedure;
   // returns the row's result (the consignment's id, 0 when the row failed).
   virtual std::int32_t ProcessRow(Procedure& proc, const Ref<host::ConNote>& conNote,
@@ -74,6 +90,11 @@ class RowWriter : public virtual RowInterface, public Lifecycle {
 
   std::size_t RowCount() const { return conNotes_.size(); }
 
+  // Writes one host log entry; while a row is processed its id also goes
+  // into the row's log list at once, so the caller sees every entry even
+  // when the row ends early.
+  void LogLine(long errorNumber, std::string_view procedure, std::string_view message);
+
   // The consignment's id as a row's result; 0 when the 32-bit result
   // cannot hold it, as that is no id the host could look up.
   static std::int32_t ConNoteIdResult(const Ref<host::ConNote>& conNote);
@@ -90,6 +111,8 @@ class RowWriter : public virtual RowInterface, public Lifecycle {
   std::size_t rowColumns_;
   // The loaded consignments in row order; row i is conNotes_[i].
   std::vector<Ref<host::ConNote>> conNotes_;
+  // The caller's log list while ProcessRow runs.
+  LogList* rowLog_ = nullptr;
 };
 
 }  // namespace quendal

@@ -24,29 +24,19 @@ Ref<host::ConNotes> StarTrackClnRows::QueryConNotes() {
 }
 
 void StarTrackClnRows::FillRow(Grid& rows, std::size_t row, const Ref<host::ConNote>& conNote) {
-  RowWriter::FillRow(rows, row, conNote);
-  if (!variant_.manifestRun) return;
-  rows(row, 4) = conNote->ConNoteDate();
-  rows(row, 5) = conNote->ScheduledDate();
-}
-
-void StarTrackClnRows::LogLine(long errorNumber, std::string_view procedure,
-                               std::string_view message) {
-  WriteLog(errorNumber, procedure, message);
-  if (errorLog_) errorLog_->push_back(LastLogId());
+  if (variant_.manifestRun)
+    FillManifestRow(rows, row, conNote);
+  else
+    RowWriter::FillRow(rows, row, conNote);
 }
 
 std::int32_t StarTrackClnRows::ProcessRow(Procedure& proc, const Ref<host::ConNote>& conNote,
-                                          LogList& vtErrorLog) {
+                                          LogList&) {
   std::int32_t result = 0;
-  errorLog_ = &vtErrorLog;
   struct Done {
-    StarTrackClnRows& self;
-    ~Done() {
-      self.errorLog_ = nullptr;
-      self.cln_.Close();
-    }
-  } done{*this};
+    ClnWriter& cln;
+    ~Done() { cln.Close(); }
+  } done{cln_};
 
   ClnConsignment consignment;
   if (!proc([&] {

@@ -47,13 +47,12 @@ class StarTrackClnRows : public ConsolidatedManifestRows, private ClnWriter::Own
   long LogLevel(long errorNumber) const override { return errorNumber; }
 
  private:
-  void LogLine(long errorNumber, std::string_view procedure, std::string_view message) override;
+  void LogLine(long errorNumber, std::string_view procedure, std::string_view message) override {
+    RowWriter::LogLine(errorNumber, procedure, message);
+  }
 
   const StarTrackRowsVariant& variant_;
   ClnWriter cln_;
-  // The caller's list while a row runs: it keeps what it held and gets each
-  // entry's id as the entry is written, as the despatch class's does.
-  LogList* errorLog_ = nullptr;
 };
 
 }  // namespace quendal

@@ -185,6 +185,12 @@ FileStamp StampFrom(const struct stat& st) {
 
 }  // namespace
 
+std::string PathBeside(const std::string& path, int n) {
+  const fs::path p(path);
+  return (p.parent_path() / (p.stem().string() + "_" + std::to_string(n) + p.extension().string()))
+      .string();
+}
+
 std::optional<FileStamp> StampOf(const std::string& path) {
   struct stat st {};
   if (::stat(path.c_str(), &st) != 0 || !S_ISREG(st.st_mode)) return std::nullopt;

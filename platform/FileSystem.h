@@ -34,6 +34,9 @@ bool ReplaceFile(const std::string& path, std::string_view bytes);
 bool DeleteFile(const std::string& path);
 // At most `maxBytes` bytes from the start of the file.
 std::optional<std::string> ReadFileHead(const std::string& path, std::size_t maxBytes);
+// The n-th name beside a file that must be left alone: "name_2.xml",
+// "name_3.xml", ... in the same folder, with the same extension.
+std::string PathBeside(const std::string& path, int n);
 // Makes the folder's entries (files created, renamed or removed in it) durable.
 bool SyncFolder(const std::string& folder);
 

@@ -7,12 +7,15 @@
 //    each time.
 //  - TNT ET11: the trailer replaced in place through the journal against
 //    rewriting the whole file without its trailer for every consignment.
+//  - DFE XML: each consignment's elements put in before the closing root
+//    tag through the journal against reading, extending and writing the
+//    whole document for every consignment.
 //
 // Each pair must leave byte-identical files. The files lie in TMPDIR (a
 // tmpfs such as /dev/shm takes the cost of flushing to disk out of the
 // figures). --no-reference skips the slow method of each pair.
 //
-//   DayScaling [cln|et11|all] [consignments] [--no-reference]
+//   DayScaling [cln|et11|dfe|all] [consignments] [--no-reference]
 #include <chrono>
 #include <cstdio>
 #include <cstdlib>
@@ -22,6 +25,7 @@
 #include <string>
 #include <vector>
 
+#include "carrierfiles/cDFEDAxml.h"
 #include "carrierfiles/cStarTrackDAcln.h"
 #include "carrierfiles/cTNTDAet11.h"
 #include "platform/Clock.h"
@@ -169,6 +173,57 @@ Run Et11Day(const fs::path& folder, int consignments, bool inPlace) {
   return run;
 }
 
+// Consignments of one to three packs added to one day's DFE despatch advice.
+Run DfeDay(const fs::path& folder, int consignments, bool inPlace) {
+  test::MemoryHost host;
+  fs::remove_all(folder);
+  fs::create_directories(folder);
+  auto carrier = host.Make<host::Carrier>({{"FileFolder", folder.string() + "/"}, {"AccountNumber", "40217"}});
+  auto address = host.Make<host::Address>({{"Name", "Harbour Stores Chadstone"},
+                                           {"Line1", "Shop 210"},
+                                           {"Line2", "Rear loading dock"},
+                                           {"Suburb", "CHADSTONE"},
+                                           {"State", "VIC"},
+                                           {"Postcode", "3148"}});
+  auto order = host.Make<host::Order>({{"DeliveryAddress", address}});
+  auto asn = host.Make<host::ASN>({{"ID", 501}, {"ASNNo", "ASN0004501"}});
+  auto despatch = host.Make<host::Despatch>({{"DespatchNo", "DSP778812"},
+                                             {"NotBefore", DateTime::FromParts(2024, 3, 15, 7, 0, 0)},
+                                             {"NotAfter", DateTime::FromParts(2024, 3, 19, 17, 0, 0)}});
+
+  clsDFEDAxml cls;
+  cls.SetTailReplacement(inPlace);
+  Run run;
+  Blocks blocks;
+  for (int i = 0; i < consignments; ++i) {
+    char number[32];
+    std::snprintf(number, sizeof number, "DFE%08d", i);
+    auto conNote =
+        host.Make<host::ConNote>({{"ConNoteId", 100000 + i},
+                                  {"ConNoteNo", number},
+                                  {"ConNoteDate", DateTime::FromParts(2024, 3, 14, 8, 0, 0)},
+                                  {"Weight", 4.5 + i % 7},
+                                  {"Carrier", carrier}});
+    std::vector<std::shared_ptr<test::MemoryObject<host::Pack>>> packs;
+    for (int p = 0; p < 1 + i % 3; ++p) {
+      char sscc[32];
+      std::snprintf(sscc, sizeof sscc, "0009312345%08d%02d", i, p);
+      packs.push_back(host.Make<host::Pack>({{"SSCC", sscc},
+                                             {"PackType", i % 10 == 9 && p == 0 ? "PALLET" : "CARTON"},
+                                             {"ASN", asn},
+                                             {"Order", order},
+                                             {"Despatch", despatch}}));
+    }
+    test::MemoryHost::Attach(conNote, packs);
+    LogList log;
+    cls.Process(host.system, conNote, asn, host::Object::As<host::PackList>(conNote->Get("Packs")),
+                log);
+    blocks.Done(i + 1, run);
+  }
+  run.file = TakeFile(folder, ".XML");
+  return run;
+}
+
 void Report(const char* name, const Run& run) {
   const auto line = [](const std::string& label, const std::vector<double>& blocks) {
     std::printf("%-24s", label.c_str());
@@ -200,17 +255,18 @@ int main(int argc, char** argv) {
   const std::string which = argc > 1 ? argv[1] : "all";
   const int consignments = argc > 2 ? std::atoi(argv[2]) : 10000;
   const bool reference = !(argc > 3 && std::string(argv[3]) == "--no-reference");
-  if ((which != "cln" && which != "et11" && which != "all") || consignments < 1000) {
+  if ((which != "cln" && which != "et11" && which != "dfe" && which != "all") ||
+      consignments < 1000) {
     std::fprintf(
         stderr,
-        "usage: DayScaling [cln|et11|all] [consignments, at least 1000] [--no-reference]\n");
+        "usage: DayScaling [cln|et11|dfe|all] [consignments, at least 1000] [--no-reference]\n");
     return 2;
   }
   SetNow(DateTime::FromParts(2024, 3, 14, 9, 0, 0));
   const fs::path root = fs::temp_directory_path() / ("quendal-day-" + std::to_string(::getpid()));
   std::printf("%d consignments to one day's file; seconds per block of 1,000\n", consignments);
   bool ok = true;
-  if (which != "et11") {
+  if (which == "cln" || which == "all") {
     const Run indexed = ClnDay(root / "indexed", consignments, true);
     Report("CLN indexed check", indexed);
     std::optional<Run> scanned;
@@ -218,13 +274,21 @@ int main(int argc, char** argv) {
       Report("CLN whole-file check", *(scanned = ClnDay(root / "scanned", consignments, false)));
     ok = Compare("CLN", indexed, scanned) && ok;
   }
-  if (which != "cln") {
+  if (which == "et11" || which == "all") {
     const Run inPlace = Et11Day(root / "in-place", consignments, true);
     Report("ET11 tail in place", inPlace);
     std::optional<Run> rewritten;
     if (reference)
       Report("ET11 whole rewrite", *(rewritten = Et11Day(root / "rewritten", consignments, false)));
     ok = Compare("ET11", inPlace, rewritten) && ok;
+  }
+  if (which == "dfe" || which == "all") {
+    const Run inPlace = DfeDay(root / "dfe-in-place", consignments, true);
+    Report("DFE elements in place", inPlace);
+    std::optional<Run> rewritten;
+    if (reference)
+      Report("DFE whole rewrite", *(rewritten = DfeDay(root / "dfe-rewritten", consignments, false)));
+    ok = Compare("DFE", inPlace, rewritten) && ok;
   }
   fs::remove_all(root);
   return ok ? 0 : 1;

@@ -202,7 +202,8 @@ std::string DfeWindowDate(const Var& date, const DateTime& now) {
   return DfeTime(*at);
 }
 
-DfeWriter::DfeWriter(const DfeVariant& variant, Owner& owner) : variant_(variant), owner_(owner) {
+DfeWriter::DfeWriter(const DfeVariant& variant, Owner& owner, std::string_view module)
+    : variant_(variant), owner_(owner), module_(module) {
   fragment_.append_child(kRoot);
 }
 
@@ -263,34 +264,54 @@ DfeValues DfeWriter::Gather(const Ref<host::ConNote>& conNote,
   return v;
 }
 
-void DfeWriter::CreateTable() {
+void DfeWriter::AddTable() {
   AppendTable<DfeValues>(fragment_.child(kRoot), "Table", kTable, values_);
 }
 
-void DfeWriter::CreateTable1() {
-  CartonLine line{values_.conNoteId, values_.connote, "ASNNo " + values_.senderReference,
-                  values_.packageType, values_.items, values_.kgs, "ITEM"};
+void DfeWriter::AddCartonLine(const Var& id, const std::string& type, const std::string& packType,
+                              const std::string& items, const std::string& kgs) {
+  const CartonLine line{id.Text(), values_.connote, "ASNNo " + values_.senderReference,
+                        packType,  items,           kgs,
+                        type};
   AppendTable<CartonLine>(fragment_.child(kRoot), "Table1", kTable1, line);
+}
+
+void DfeWriter::AddLabelLine(const Ref<host::Pack>& pack) {
+  const LabelLine line{values_.conNoteId, values_.connote, Read(pack, &host::Pack::SSCC).Text()};
+  AppendTable<LabelLine>(fragment_.child(kRoot), "Table2", kTable2, line);
+}
+
+void DfeWriter::CreateTable() {
+  Procedure proc(module_, "Sub CreateTable");
+  proc([&] { AddTable(); });
+}
+
+void DfeWriter::CreateTable1() {
+  Procedure proc(module_, "Sub CreateTable1");
+  proc([&] {
+    AddCartonLine(Var(values_.conNoteId), "ITEM", values_.packageType, values_.items, values_.kgs);
+  });
 }
 
 void DfeWriter::CreateTable1(const Var& iID, const std::string& sType, const std::string& sPackType,
                              const std::string& sItemCount, std::int64_t lweight) {
-  CartonLine line{iID.Text(), values_.connote, "ASNNo " + values_.senderReference,
-                  sPackType,  sItemCount,      WholeKilograms(lweight),
-                  sType};
-  AppendTable<CartonLine>(fragment_.child(kRoot), "Table1", kTable1, line);
+  Procedure proc(module_, "Sub CreateTable1");
+  proc([&] { AddCartonLine(iID, sType, sPackType, sItemCount, WholeKilograms(lweight)); });
 }
 
 void DfeWriter::CreateTable2(const Ref<host::Pack>& objPack, std::int32_t) {
-  LabelLine line{values_.conNoteId, values_.connote, Read(objPack, &host::Pack::SSCC).Text()};
-  AppendTable<LabelLine>(fragment_.child(kRoot), "Table2", kTable2, line);
+  Procedure proc(module_, "Sub CreateTable2");
+  proc([&] { AddLabelLine(objPack); });
 }
 
 void DfeWriter::GetTotals(const Ref<host::PackList>& lstPacks) {
-  std::vector<Ref<host::Pack>> packs;
-  if (lstPacks)
-    for (Ref<host::Pack> pack : *lstPacks) packs.push_back(pack);
-  Sum(packs);
+  Procedure proc(module_, "Sub GetTotals");
+  proc([&] {
+    std::vector<Ref<host::Pack>> packs;
+    if (lstPacks)
+      for (Ref<host::Pack> pack : *lstPacks) packs.push_back(pack);
+    Sum(packs);
+  });
 }
 
 void DfeWriter::Sum(const std::vector<Ref<host::Pack>>& packs) {
@@ -313,21 +334,22 @@ void DfeWriter::Sum(const std::vector<Ref<host::Pack>>& packs) {
 std::string DfeWriter::Elements() {
   fragment_.reset();
   fragment_.append_child(kRoot);
-  CreateTable();
+  AddTable();
   if (variant_.linePerGroup) {
     if (!values_.cartons.empty()) {
       Sum(values_.cartons);
-      CreateTable1(Var(1), "ITEM", values_.packageType, std::to_string(totals_.packs), totals_.weight);
+      AddCartonLine(Var(1), "ITEM", values_.packageType, std::to_string(totals_.packs),
+                    WholeKilograms(totals_.weight));
     }
     if (!values_.pallets.empty()) {
       Sum(values_.pallets);
-      CreateTable1(Var(2), "PALLET", "Pallet", std::to_string(totals_.packs), totals_.weight);
+      AddCartonLine(Var(2), "PALLET", "Pallet", std::to_string(totals_.packs),
+                    WholeKilograms(totals_.weight));
     }
   } else if (!values_.cartons.empty()) {
-    CreateTable1();
+    AddCartonLine(Var(values_.conNoteId), "ITEM", values_.packageType, values_.items, values_.kgs);
   }
-  std::int32_t position = 0;
-  for (const Ref<host::Pack>& pack : values_.packs) CreateTable2(pack, ++position);
+  for (const Ref<host::Pack>& pack : values_.packs) AddLabelLine(pack);
 
   std::string elements;
   for (pugi::xml_node table : fragment_.child(kRoot).children()) xml::AppendIndented(elements, table, 1);

@@ -90,7 +90,8 @@ class DfeWriter {
   };
 
   // The document's tables, each appended to the consignment being written
-  // from the values Process gathered for it.
+  // from the values Process gathered for it; each runs under its own
+  // procedure guard, as the host may call them.
   void CreateTable();
   // The cartons' line: the consignment's id, "ITEM", the cartons' package
   // type and count, and the consignment's weight.
@@ -110,8 +111,8 @@ class DfeWriter {
   void SetTailReplacement(bool enabled) { tailReplacement_ = enabled; }
 
  protected:
-  // Both must outlive the writer.
-  DfeWriter(const DfeVariant& variant, Owner& owner);
+  // Both must outlive the writer; `module` names the class in error reports.
+  DfeWriter(const DfeVariant& variant, Owner& owner, std::string_view module);
 
   // Writes the consignment to the day's file in `folder` as further steps
   // of `proc`; true once its elements are in the file and `written` (when
@@ -130,6 +131,11 @@ class DfeWriter {
 
   static DfeValues Gather(const Ref<host::ConNote>& conNote, const Ref<host::PackList>& packs,
                        const Var& accountNumber);
+  // The unguarded work of the public builders.
+  void AddTable();
+  void AddCartonLine(const Var& id, const std::string& type, const std::string& packType,
+                     const std::string& items, const std::string& kgs);
+  void AddLabelLine(const Ref<host::Pack>& pack);
   void Sum(const std::vector<Ref<host::Pack>>& packs);
   // The consignment's elements as the file holds them under its root.
   std::string Elements();
@@ -141,6 +147,7 @@ class DfeWriter {
 
   const DfeVariant& variant_;
   Owner& owner_;
+  std::string module_;
   bool tailReplacement_ = true;
   DfeValues values_;
   DfeTotals totals_;

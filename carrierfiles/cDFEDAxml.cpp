@@ -13,7 +13,7 @@ constexpr DfeVariant kDespatch{.refusePackless = true, .linePerGroup = false};
 
 }  // namespace
 
-clsDFEDAxml::clsDFEDAxml() : ConsignmentWriter("clsDFEDAxml"), DfeWriter(kDespatch, *this) {}
+clsDFEDAxml::clsDFEDAxml() : ConsignmentWriter("clsDFEDAxml"), DfeWriter(kDespatch, *this, ModuleName()) {}
 
 bool clsDFEDAxml::DangerouseGoodsDeclaration(const Ref<host::ConNote>& aConnote) {
   return PrintDangerousGoodsDeclaration(DeclarationForm::DFE, system_, aConnote, ModuleName());

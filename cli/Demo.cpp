@@ -117,6 +117,7 @@ int RunDemo(const std::string& out, std::ostream& cout, bool asJson) {
     fs::create_directories(root / "spool" / SafeFileName(carrier.printer));
     std::ofstream(root / "spool" / SafeFileName(carrier.printer) / "printer.ini") << kThermalPrinter;
     fs::create_directories(carrier.folder);
+    fs::create_directories(carrier.outputFolder);
     // An ordinary printer per carrier, on which one label is drawn as a picture.
     const fs::path drawn = root / "spool" / SafeFileName(DrawnPrinter(carrier.name));
     fs::create_directories(drawn);

@@ -159,6 +159,9 @@ DemoData BuildDemoData(const std::string& root, DateTime now) {
         number = std::string(known.accountNumber);
       }
     const std::string folder = root + "/carriers/" + code + "/";
+    // DFE's despatch advice and its manifest run write the same day's file
+    // name; the run writes to a folder of its own, so the demo shows both.
+    const std::string outputFolder = names[i] == "DFE" ? folder + "manifest/" : folder;
     json carrier = {{"CarrierId", id},           {"CarrierCode", code},
                     {"Name", names[i]},          {"Options", nullptr},
                     {"NotifyOptions", nullptr},  {"AccountRef", code + "01"},
@@ -167,8 +170,8 @@ DemoData BuildDemoData(const std::string& root, DateTime now) {
     if (!account.notifyOptions.empty()) carrier["NotifyOptions"] = account.notifyOptions;
     doc["Carriers"].push_back(carrier);
     doc["EDIDocuments"].push_back(
-        {{"ID", id}, {"VendorId", 1}, {"PartnerId", 1}, {"CarrierId", id}, {"OutputFolder", folder}});
-    data.carriers.push_back({id, id, names[i], names[i] + " Labels", folder});
+        {{"ID", id}, {"VendorId", 1}, {"PartnerId", 1}, {"CarrierId", id}, {"OutputFolder", outputFolder}});
+    data.carriers.push_back({id, id, names[i], names[i] + " Labels", folder, outputFolder});
     services.emplace_back(account.service);
   }
   const auto carrierCount = static_cast<int>(names.size());

@@ -20,6 +20,7 @@ struct DemoCarrier {
   std::string name;     // as the catalogue names the carrier
   std::string printer;  // its label printer (a folder of the directory spooler)
   std::string folder;   // its FileFolder, ending in "/"
+  std::string outputFolder;  // its EDI document's OutputFolder, ending in "/"
 };
 
 // A file the demo lays down beside the data before it runs the classes.

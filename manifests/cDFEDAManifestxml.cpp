@@ -17,7 +17,7 @@ constexpr std::size_t kRowColumns = 7;
 clsDFEDAManifestxml::clsDFEDAManifestxml()
     : ConsolidatedManifestRows("clsDFEDAManifestxml", kManifestColumns, kRowColumns,
                                SummarySource::OwnManifest),
-      DfeWriter(kManifestRun, *this) {}
+      DfeWriter(kManifestRun, *this, ModuleName()) {}
 
 bool clsDFEDAManifestxml::DangerouseGoodsDeclaration(const Ref<host::ConNote>& aConnote) {
   return PrintDangerousGoodsDeclaration(DeclarationForm::StarTrack, system_, aConnote,

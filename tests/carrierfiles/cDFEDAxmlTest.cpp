@@ -131,6 +131,16 @@ TEST_F(DFEDAxmlTest, IdentifierWeightAndWindowRules) {
   EXPECT_EQ(DfeWindowDate(Var(now), now), "2024-03-14T09:00:00+10");
   EXPECT_EQ(DfeWindowDate(Var(), now), "");
   EXPECT_EQ(DfeWindowDate(Var("soon"), now), "");
+
+  // The packs' weights are summed, then rounded to whole kilograms once.
+  auto packs = AddCartons(101, "DFE1", 3)->Packs();
+  const double weights[] = {2.5, 2.5, 0};
+  for (int i = 1; i <= 3; ++i) packs->Item(i)->Set("Weight", weights[i - 1]);
+  packs->Item(1)->Carton()->Set("Length", 0.4);
+  cls.GetTotals(packs);
+  EXPECT_EQ(cls.Totals().packs, 3);
+  EXPECT_EQ(cls.Totals().weight, 5);
+  EXPECT_DOUBLE_EQ(cls.Totals().length, 0.4);
 }
 
 TEST_F(DFEDAxmlTest, ChecksBeforeAnythingIsWritten) {

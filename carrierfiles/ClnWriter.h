@@ -13,6 +13,7 @@
 #include <string_view>
 
 #include "carrierfiles/ConsignmentIndex.h"
+#include "carrierfiles/ConsignmentOwner.h"
 #include "frame/FailSafe.h"
 #include "frame/host/Host.h"
 #include "platform/FileSystem.h"
@@ -49,14 +50,7 @@ double CubeByItemCount(const Var& itemCount);
 class ClnWriter {
  public:
   // What the writer needs of the class it writes for.
-  class Owner {
-   public:
-    virtual ~Owner() = default;
-    // Writes one host log entry and hands its id to the caller.
-    virtual void LogLine(long errorNumber, std::string_view procedure, std::string_view message) = 0;
-    // Prints the consignment's dangerous goods declaration; false when it could not.
-    virtual bool DangerouseGoodsDeclaration(const Ref<host::ConNote>& aConnote) = 0;
-  };
+  using Owner = ConsignmentOwner;
 
   // Both must outlive the writer.
   ClnWriter(const ClnVariant& variant, Owner& owner) : variant_(variant), owner_(owner) {}

@@ -30,6 +30,7 @@
 #include <unordered_set>
 #include <vector>
 
+#include "carrierfiles/ConsignmentOwner.h"
 #include "frame/FailSafe.h"
 #include "frame/host/Host.h"
 #include "platform/FileSystem.h"
@@ -80,14 +81,7 @@ std::string DfeWindowDate(const Var& date, const DateTime& now);
 class DfeWriter {
  public:
   // What the writer needs of the class it writes for.
-  class Owner {
-   public:
-    virtual ~Owner() = default;
-    // Writes one host log entry and hands its id to the caller.
-    virtual void LogLine(long errorNumber, std::string_view procedure, std::string_view message) = 0;
-    // Prints the consignment's dangerous goods declaration; false when it could not.
-    virtual bool DangerouseGoodsDeclaration(const Ref<host::ConNote>& aConnote) = 0;
-  };
+  using Owner = ConsignmentOwner;
 
   // The document's tables, each appended to the consignment being written
   // from the values Process gathered for it; each runs under its own

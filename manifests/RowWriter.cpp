@@ -192,4 +192,14 @@ bool RowWriter::SaveManifestRecord() {
   return manifest_->ManifestId().NumberOr(0) != 0;
 }
 
+bool RowWriter::ManifestSaved(Procedure& proc, std::string_view failure) {
+  bool saved = false;
+  if (!proc([&] { saved = SaveManifestRecord(); })) return false;
+  return proc([&] {
+    if (saved) return true;
+    LogLine(0, "Process", failure);
+    return false;
+  });
+}
+
 }  // namespace quendal

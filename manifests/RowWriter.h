@@ -87,6 +87,9 @@ class RowWriter : public virtual RowInterface, public Lifecycle {
   // Gives the run's manifest record its vendor, carrier and date and saves
   // it, once per object; true when the record has an id.
   bool SaveManifestRecord();
+  // SaveManifestRecord as steps of a row's Process; when the record is not
+  // saved, logs `failure` under "Process" and returns false.
+  bool ManifestSaved(Procedure& proc, std::string_view failure);
 
   std::size_t RowCount() const { return conNotes_.size(); }
 

@@ -53,14 +53,7 @@ std::int32_t StarTrackClnRows::ProcessRow(Procedure& proc, const Ref<host::ConNo
       }))
     return result;
   if (variant_.manifestRun) {
-    bool saved = false;
-    if (!proc([&] { saved = SaveManifestRecord(); })) return result;
-    if (!proc([&] {
-          if (saved) return true;
-          LogLine(0, "Process", "Failed to create manifest ID");
-          return false;
-        }))
-      return result;
+    if (!ManifestSaved(proc, "Failed to create manifest ID")) return result;
     if (!proc([&] { consignment.manifestNumber = manifest_->ManifestNumber(); })) return result;
   }
   // A consignment counts as manifested once its records are in the file.

@@ -27,14 +27,7 @@ bool clsDFEDAManifestxml::DangerouseGoodsDeclaration(const Ref<host::ConNote>& a
 std::int32_t clsDFEDAManifestxml::ProcessRow(Procedure& proc, const Ref<host::ConNote>& conNote,
                                              LogList&) {
   std::int32_t result = 0;
-  bool saved = false;
-  if (!proc([&] { saved = SaveManifestRecord(); })) return result;
-  if (!proc([&] {
-        if (saved) return true;
-        LogLine(0, "Process", "Failed to create mainifest ID");
-        return false;
-      }))
-    return result;
+  if (!ManifestSaved(proc, "Failed to create mainifest ID")) return result;
   std::string folder;
   if (!proc([&] { folder = ediDocument_->OutputFolder().Text(); })) return result;
   // A consignment counts as manifested once its elements are in the file.

@@ -15,7 +15,6 @@
 
 namespace quendal {
 
-using host::First;
 using host::Read;
 
 namespace {
@@ -366,19 +365,23 @@ DfeWriter::Known* DfeWriter::Inspect(const std::string& file) {
     missing = Known{};
     return &missing;
   }
-  if (auto it = known_.find(file); it != known_.end() && it->second.stamp == stamp) return &it->second;
+  if (auto it = known_.find(file); it != known_.end() && it->second.stamp == stamp)
+    return it->second.extendable ? &it->second : nullptr;
   // Not as this writer left it: read it whole once.
   known_.erase(file);
   const std::optional<std::string> bytes = ReadFile(file);
   if (!bytes) return nullptr;
-  Known known;
+  Known& known = known_[file];
   known.stamp = stamp;
   if (!bytes->empty()) {
     const std::unique_ptr<DayDocument> day = ParseDay(*bytes);
-    if (!day) return nullptr;
+    if (!day) {
+      known.extendable = false;
+      return nullptr;
+    }
     known.connotes = ConnotesOf(day->root);
   }
-  return &(known_[file] = std::move(known));
+  return &known;
 }
 
 DfeWriter::Added DfeWriter::Insert(const std::string& file, const std::string& elements) {
@@ -455,7 +458,8 @@ bool DfeWriter::AddToDayFile(const std::string& path, const std::string& no,
     const Added added = tailReplacement_ ? Insert(file, elements) : Rewrite(file);
     if (added == Added::Stopped) return false;
     if (added == Added::NotExtendable) {
-      known_.erase(file);
+      known->extendable = false;
+      known->stamp = StampOf(file);
       kept.push_back(file);
       continue;
     }

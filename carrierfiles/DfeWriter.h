@@ -119,6 +119,7 @@ class DfeWriter {
   // A day's file as this writer last found or left it.
   struct Known {
     std::optional<FileStamp> stamp;  // none: the file did not exist
+    bool extendable = true;          // false: a file to leave alone
     std::unordered_set<std::string> connotes;
   };
   enum class Added { Written, NotExtendable, Stopped };

@@ -188,6 +188,35 @@ TEST_F(DFEDAxmlTest, ADayFileItCannotReadIsKeptAndAConsignmentIsWrittenOnce) {
                           "ConNote DFE00012346 compile completed."));
 }
 
+TEST_F(DFEDAxmlTest, OnlyAUtf8NewDataSetEndingInItsEndTagIsExtended) {
+  const std::string beside = folder + "MANIFEST_40217_202403141200_2.XML";
+  const std::string others[] = {
+      "<NewDataSet/>\r\n",
+      "<?xml version='1.0' encoding='windows-1252'?>\r\n<NewDataSet>\r\n</NewDataSet>\r\n",
+      kHead + kTail + "<!-- after the root -->\r\n",
+      "<Other></Other>\r\n",
+  };
+  for (const std::string& other : others) {
+    test::WriteText(path, other);
+    fs::remove(beside);
+    clsDFEDAxml fresh;
+    LogList log;
+    fresh.Process(host.system, AddCartons(101, "DFE00012345", 1), asn, nullptr, log);
+    EXPECT_EQ(File(), other);
+    EXPECT_THAT(Connotes(ReadFile(beside).value_or("")), ElementsAre("4021710012345")) << other;
+  }
+  // Written by another hand on one line, or empty: extended in place.
+  for (const std::string& mine : {std::string("<NewDataSet><Table><Connote>1</Connote></Table></NewDataSet>"),
+                                  std::string()}) {
+    test::WriteText(path, mine);
+    clsDFEDAxml fresh;
+    LogList log;
+    fresh.Process(host.system, AddCartons(102, "DFE00012346", 1), asn, nullptr, log);
+    EXPECT_TRUE(File().starts_with(mine.empty() ? kHead : mine.substr(0, mine.size() - 13)));
+    EXPECT_EQ(Connotes(File()).back(), "4021710012346");
+  }
+}
+
 TEST_F(DFEDAxmlTest, AFailedWriteLeavesTheDayFileAndACrashedOneIsCompleted) {
   test::ScriptedPrompt answers;
   test::PromptScope prompt{std::shared_ptr<ErrorPrompt>(&answers, [](ErrorPrompt*) {})};

@@ -178,7 +178,8 @@ Run DfeDay(const fs::path& folder, int consignments, bool inPlace) {
   test::MemoryHost host;
   fs::remove_all(folder);
   fs::create_directories(folder);
-  auto carrier = host.Make<host::Carrier>({{"FileFolder", folder.string() + "/"}, {"AccountNumber", "40217"}});
+  auto carrier =
+      host.Make<host::Carrier>({{"FileFolder", folder.string() + "/"}, {"AccountNumber", "40217"}});
   auto address = host.Make<host::Address>({{"Name", "Harbour Stores Chadstone"},
                                            {"Line1", "Shop 210"},
                                            {"Line2", "Rear loading dock"},
@@ -187,9 +188,10 @@ Run DfeDay(const fs::path& folder, int consignments, bool inPlace) {
                                            {"Postcode", "3148"}});
   auto order = host.Make<host::Order>({{"DeliveryAddress", address}});
   auto asn = host.Make<host::ASN>({{"ID", 501}, {"ASNNo", "ASN0004501"}});
-  auto despatch = host.Make<host::Despatch>({{"DespatchNo", "DSP778812"},
-                                             {"NotBefore", DateTime::FromParts(2024, 3, 15, 7, 0, 0)},
-                                             {"NotAfter", DateTime::FromParts(2024, 3, 19, 17, 0, 0)}});
+  auto despatch =
+      host.Make<host::Despatch>({{"DespatchNo", "DSP778812"},
+                                 {"NotBefore", DateTime::FromParts(2024, 3, 15, 7, 0, 0)},
+                                 {"NotAfter", DateTime::FromParts(2024, 3, 19, 17, 0, 0)}});
 
   clsDFEDAxml cls;
   cls.SetTailReplacement(inPlace);
@@ -208,11 +210,12 @@ Run DfeDay(const fs::path& folder, int consignments, bool inPlace) {
     for (int p = 0; p < 1 + i % 3; ++p) {
       char sscc[32];
       std::snprintf(sscc, sizeof sscc, "0009312345%08d%02d", i, p);
-      packs.push_back(host.Make<host::Pack>({{"SSCC", sscc},
-                                             {"PackType", i % 10 == 9 && p == 0 ? "PALLET" : "CARTON"},
-                                             {"ASN", asn},
-                                             {"Order", order},
-                                             {"Despatch", despatch}}));
+      packs.push_back(
+          host.Make<host::Pack>({{"SSCC", sscc},
+                                 {"PackType", i % 10 == 9 && p == 0 ? "PALLET" : "CARTON"},
+                                 {"ASN", asn},
+                                 {"Order", order},
+                                 {"Despatch", despatch}}));
     }
     test::MemoryHost::Attach(conNote, packs);
     LogList log;
@@ -287,7 +290,8 @@ int main(int argc, char** argv) {
     Report("DFE elements in place", inPlace);
     std::optional<Run> rewritten;
     if (reference)
-      Report("DFE whole rewrite", *(rewritten = DfeDay(root / "dfe-rewritten", consignments, false)));
+      Report("DFE whole rewrite",
+             *(rewritten = DfeDay(root / "dfe-rewritten", consignments, false)));
     ok = Compare("DFE", inPlace, rewritten) && ok;
   }
   fs::remove_all(root);

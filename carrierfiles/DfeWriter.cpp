@@ -27,7 +27,8 @@ constexpr const char* kComment = "DFE Despatch Advice file created by Merivane."
 // A new file: declaration, comment and the root's start tag, then the
 // consignments' elements, then the root's end tag.
 constexpr std::string_view kDeclaration = "<?xml version='1.0'?>\r\n";
-const std::string kHead = std::string(kDeclaration) + "<!--" + kComment + "-->\r\n<" + kRoot + ">\r\n";
+const std::string kHead =
+    std::string(kDeclaration) + "<!--" + kComment + "-->\r\n<" + kRoot + ">\r\n";
 const std::string kTail = std::string("</") + kRoot + ">\r\n";
 
 // Names beside an unreadable day file that are tried before giving up.
@@ -115,7 +116,8 @@ std::unique_ptr<DayDocument> ParseDay(std::string_view bytes) {
 
 std::unordered_set<std::string> ConnotesOf(pugi::xml_node root) {
   std::unordered_set<std::string> connotes;
-  for (pugi::xml_node table : root.children("Table")) connotes.emplace(table.child("Connote").text().get());
+  for (pugi::xml_node table : root.children("Table"))
+    connotes.emplace(table.child("Connote").text().get());
   return connotes;
 }
 
@@ -206,8 +208,8 @@ DfeWriter::DfeWriter(const DfeVariant& variant, Owner& owner, std::string_view m
   fragment_.append_child(kRoot);
 }
 
-DfeValues DfeWriter::Gather(const Ref<host::ConNote>& conNote,
-                                    const Ref<host::PackList>& packs, const Var& accountNumber) {
+DfeValues DfeWriter::Gather(const Ref<host::ConNote>& conNote, const Ref<host::PackList>& packs,
+                            const Var& accountNumber) {
   DfeValues v;
   if (packs)
     for (Ref<host::Pack> pack : *packs) v.packs.push_back(pack);
@@ -269,9 +271,8 @@ void DfeWriter::AddTable() {
 
 void DfeWriter::AddCartonLine(const Var& id, const std::string& type, const std::string& packType,
                               const std::string& items, const std::string& kgs) {
-  const CartonLine line{id.Text(), values_.connote, "ASNNo " + values_.senderReference,
-                        packType,  items,           kgs,
-                        type};
+  const CartonLine line{
+      id.Text(), values_.connote, "ASNNo " + values_.senderReference, packType, items, kgs, type};
   AppendTable<CartonLine>(fragment_.child(kRoot), "Table1", kTable1, line);
 }
 
@@ -351,7 +352,8 @@ std::string DfeWriter::Elements() {
   for (const Ref<host::Pack>& pack : values_.packs) AddLabelLine(pack);
 
   std::string elements;
-  for (pugi::xml_node table : fragment_.child(kRoot).children()) xml::AppendIndented(elements, table, 1);
+  for (pugi::xml_node table : fragment_.child(kRoot).children())
+    xml::AppendIndented(elements, table, 1);
   return elements;
 }
 
@@ -472,8 +474,8 @@ bool DfeWriter::AddToDayFile(const std::string& path, const std::string& no,
   return false;
 }
 
-bool DfeWriter::Write(Procedure& proc, const Ref<host::ConNote>& conNote,
-                      const std::string& folder, const std::function<bool()>& written) {
+bool DfeWriter::Write(Procedure& proc, const Ref<host::ConNote>& conNote, const std::string& folder,
+                      const std::function<bool()>& written) {
   std::string no;
   Ref<host::PackList> packs;
   std::int32_t count = 0;

@@ -125,7 +125,7 @@ class DfeWriter {
   enum class Added { Written, NotExtendable, Stopped };
 
   static DfeValues Gather(const Ref<host::ConNote>& conNote, const Ref<host::PackList>& packs,
-                       const Var& accountNumber);
+                          const Var& accountNumber);
   // The unguarded work of the public builders.
   void AddTable();
   void AddCartonLine(const Var& id, const std::string& type, const std::string& packType,

@@ -13,7 +13,8 @@ constexpr DfeVariant kDespatch{.refusePackless = true, .linePerGroup = false};
 
 }  // namespace
 
-clsDFEDAxml::clsDFEDAxml() : ConsignmentWriter("clsDFEDAxml"), DfeWriter(kDespatch, *this, ModuleName()) {}
+clsDFEDAxml::clsDFEDAxml()
+    : ConsignmentWriter("clsDFEDAxml"), DfeWriter(kDespatch, *this, ModuleName()) {}
 
 bool clsDFEDAxml::DangerouseGoodsDeclaration(const Ref<host::ConNote>& aConnote) {
   return PrintDangerousGoodsDeclaration(DeclarationForm::DFE, system_, aConnote, ModuleName());
@@ -24,9 +25,7 @@ void clsDFEDAxml::Compile(const Ref<host::ConNote>& objConNote, const Ref<host::
                           const Ref<host::PackList>&) {
   Procedure proc = Guard("Sub Process");
   std::string folder;
-  if (!proc([&] {
-        folder = host::Read(objConNote->Carrier(), &host::Carrier::FileFolder).Text();
-      }))
+  if (!proc([&] { folder = host::Read(objConNote->Carrier(), &host::Carrier::FileFolder).Text(); }))
     return;
   Write(proc, objConNote, folder);
 }

@@ -35,8 +35,8 @@ struct TableCells {
   std::string dangerous = "False";
   std::string name = "Myer Chadstone";
   // Address lines, city, state and postcode.
-  std::array<std::string, 5> address = {"1341 Dandenong Road", "Loading Dock 3", "CHADSTONE",
-                                        "VIC", "3148"};
+  std::array<std::string, 5> address = {"1341 Dandenong Road", "Loading Dock 3", "CHADSTONE", "VIC",
+                                        "3148"};
 };
 
 inline std::string Table(const TableCells& t) {
@@ -82,7 +82,8 @@ inline std::string Table1(const std::string& id, const std::string& connote,
 
 inline std::string Table2(const std::string& id, const std::string& connote,
                           const std::string& sscc) {
-  return Block("Table2", {{"ConnoteDetailsId", id}, {"Connote", connote}, {"LabelTrackCode", sscc}});
+  return Block("Table2",
+               {{"ConnoteDetailsId", id}, {"Connote", connote}, {"LabelTrackCode", sscc}});
 }
 
 }  // namespace quendal::test::dfe

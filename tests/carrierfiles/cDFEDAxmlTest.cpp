@@ -1,5 +1,3 @@
-#include "carrierfiles/cDFEDAxml.h"
-
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 #include <sys/wait.h>
@@ -10,6 +8,7 @@
 #include <set>
 
 #include "carrierfiles/TailJournal.h"
+#include "carrierfiles/cDFEDAxml.h"
 #include "tests/carrierfiles/DfeGolden.h"
 #include "tests/manifests/StarTrackRowsFixture.h"
 #include "tests/support/FileSizeLimit.h"
@@ -53,7 +52,8 @@ class DFEDAxmlTest : public test::StarTrackRowsFixture {
 
 TEST_F(DFEDAxmlTest, FirstAndSecondConsignmentOfTheDay) {
   // Dangerous goods in the first carton of the first consignment.
-  auto aerosol = host.Make<host::Product>({{"IsDangerous", true}, {"DGClass", "2.1"}, {"UnitWeight", 0.75}});
+  auto aerosol =
+      host.Make<host::Product>({{"IsDangerous", true}, {"DGClass", "2.1"}, {"UnitWeight", 0.75}});
   auto dgPack = Pack(Sscc(1), 12);
   dgPack->fields["Lines"] = Var(test::MemoryHost::List<host::PackLine>(
       {host.Make<host::PackLine>({{"Product", aerosol}, {"Qty", 4}})}));
@@ -71,10 +71,10 @@ TEST_F(DFEDAxmlTest, FirstAndSecondConsignmentOfTheDay) {
 
   // Two pallets, no weight, a delivery window that has started: no carton
   // line, no cartons, the lightest weight and no start date.
-  auto window = host.Make<host::Despatch>(
-      {{"DespatchNo", "DSP778812"},
-       {"NotBefore", DateTime::FromParts(2024, 3, 14, 7, 0, 0)},
-       {"NotAfter", DateTime::FromParts(2024, 3, 15, 17, 0, 0)}});
+  auto window =
+      host.Make<host::Despatch>({{"DespatchNo", "DSP778812"},
+                                 {"NotBefore", DateTime::FromParts(2024, 3, 14, 7, 0, 0)},
+                                 {"NotAfter", DateTime::FromParts(2024, 3, 15, 17, 0, 0)}});
   std::vector<std::shared_ptr<MemoryObject<host::Pack>>> pallets = {Pack(Sscc(3), 60, "PLT01"),
                                                                     Pack(Sscc(4), 60, "PLT01")};
   pallets[0]->fields["PackType"] = "PALLET";
@@ -109,7 +109,9 @@ TEST_F(DFEDAxmlTest, TextsAreEscapedAndTheFileStaysInItsFolder) {
   Process(AddCartons(101, "DFE00012345", 1));
   EXPECT_THAT(FilesInFolder(), ElementsAre("MANIFEST____12_202403141200.XML"));
   const std::string file = ReadFile(folder + "MANIFEST____12_202403141200.XML").value_or("");
-  EXPECT_THAT(file, HasSubstr("<ReceiverName>Smith &amp; Sons &lt;\"Dock\"&gt; Caf\xC3\xA9 </ReceiverName>"));
+  EXPECT_THAT(
+      file,
+      HasSubstr("<ReceiverName>Smith &amp; Sons &lt;\"Dock\"&gt; Caf\xC3\xA9 </ReceiverName>"));
   pugi::xml_document doc;
   ASSERT_TRUE(doc.load_string(file.c_str()));
   pugi::xml_node table = doc.child("NewDataSet").child("Table");
@@ -154,17 +156,18 @@ TEST_F(DFEDAxmlTest, ChecksBeforeAnythingIsWritten) {
     carrier->fields["AccountNumber"] = account;
     Process(AddCartons(104, "DFE4", 1));
   }
-  EXPECT_THAT(host.LogMessages(),
-              ElementsAre("Shipments has no packs DFE1",
-                          "Invalid folder " + folder.substr(0, folder.size() - 1),
-                          "Invalid folder " + folder + "missing/",
-                          "Invalid Carrier Account Reffolder 4021",
-                          "Invalid Carrier Account Reffolder 402171"));
+  EXPECT_THAT(
+      host.LogMessages(),
+      ElementsAre("Shipments has no packs DFE1",
+                  "Invalid folder " + folder.substr(0, folder.size() - 1),
+                  "Invalid folder " + folder + "missing/", "Invalid Carrier Account Reffolder 4021",
+                  "Invalid Carrier Account Reffolder 402171"));
   std::vector<std::string> sources;
   for (const auto& entry : host.logs) sources.push_back(entry.at("Procedure").Text());
-  EXPECT_THAT(sources, ElementsAre("DFEXML processing", "Open carrier message file",
-                                   "Open carrier message file", "Carrier Account Ref must be 5 digits",
-                                   "Carrier Account Ref must be 5 digits"));
+  EXPECT_THAT(
+      sources,
+      ElementsAre("DFEXML processing", "Open carrier message file", "Open carrier message file",
+                  "Carrier Account Ref must be 5 digits", "Carrier Account Ref must be 5 digits"));
   EXPECT_TRUE(FilesInFolder().empty());
 }
 
@@ -176,7 +179,8 @@ TEST_F(DFEDAxmlTest, ADayFileItCannotReadIsKeptAndAConsignmentIsWrittenOnce) {
   Process(AddCartons(102, "DFE00012346", 1));
   EXPECT_EQ(File(), torn);
   const std::string beside = folder + "MANIFEST_40217_202403141200_2.XML";
-  EXPECT_THAT(Connotes(ReadFile(beside).value_or("")), ElementsAre("4021710012345", "4021710012346"));
+  EXPECT_THAT(Connotes(ReadFile(beside).value_or("")),
+              ElementsAre("4021710012345", "4021710012346"));
   const std::string kept = "Despatch advice file " + path +
                            " cannot be read as a DFE despatch advice; it is kept and ConNote ";
   EXPECT_THAT(host.LogMessages(),
@@ -206,8 +210,9 @@ TEST_F(DFEDAxmlTest, OnlyAUtf8NewDataSetEndingInItsEndTagIsExtended) {
     EXPECT_THAT(Connotes(ReadFile(beside).value_or("")), ElementsAre("4021710012345")) << other;
   }
   // Written by another hand on one line, or empty: extended in place.
-  for (const std::string& mine : {std::string("<NewDataSet><Table><Connote>1</Connote></Table></NewDataSet>"),
-                                  std::string()}) {
+  for (const std::string& mine :
+       {std::string("<NewDataSet><Table><Connote>1</Connote></Table></NewDataSet>"),
+        std::string()}) {
     test::WriteText(path, mine);
     clsDFEDAxml fresh;
     LogList log;
@@ -239,7 +244,9 @@ TEST_F(DFEDAxmlTest, AFailedWriteLeavesTheDayFileAndACrashedOneIsCompleted) {
   TailJournal journal(path);
   const auto begun = journal.Begin(
       [&](const TailJournal::End& end) { return std::optional(end.bytes.size() - kTail.size()); },
-      [&](std::string_view) { return Table({.connote = "4021710012347", .items = "1", .kgs = "12"}) + added + kTail; });
+      [&](std::string_view) {
+        return Table({.connote = "4021710012347", .items = "1", .kgs = "12"}) + added + kTail;
+      });
   ASSERT_TRUE(begun.pending);
   fs::resize_file(path, begun.pending->offset);
   Process(AddCartons(104, "DFE00012348", 1));

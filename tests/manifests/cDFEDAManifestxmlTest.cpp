@@ -1,8 +1,7 @@
-#include "manifests/cDFEDAManifestxml.h"
-
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
+#include "manifests/cDFEDAManifestxml.h"
 #include "tests/carrierfiles/DfeGolden.h"
 #include "tests/manifests/StarTrackRowsFixture.h"
 
@@ -30,7 +29,8 @@ class DFEDAManifestxmlTest : public test::StarTrackRowsFixture {
 
 TEST_F(DFEDAManifestxmlTest, PalletsAndCartonsGetALineEachAndTheConsignmentIsStamped) {
   // Two pallets and three cartons, the first a pallet, with dangerous goods.
-  auto aerosol = host.Make<host::Product>({{"IsDangerous", true}, {"DGClass", "2.1"}, {"UnitWeight", 0.75}});
+  auto aerosol =
+      host.Make<host::Product>({{"IsDangerous", true}, {"DGClass", "2.1"}, {"UnitWeight", 0.75}});
   std::vector<std::shared_ptr<test::MemoryObject<host::Pack>>> packs = {
       Pack(Sscc(1), 60, "PLT01"), Pack(Sscc(2), 3), Pack(Sscc(3), 60, "PLT01"), Pack(Sscc(4), 3),
       Pack(Sscc(5), 3)};
@@ -93,11 +93,16 @@ TEST_F(DFEDAManifestxmlTest, AFailedManifestSaveStopsTheRowAndAConsignmentWithou
 
   host.manifestSaveFails = false;
   EXPECT_EQ(run.rows->Process(0, run.log), 101);
-  EXPECT_EQ(ReadFile(path).value_or(""),
-            kHead +
-                Table({.connote = "4021710012345", .items = "0", .kgs = "12", .reference = "PONo ", .start = "",
-                       .stop = "", .name = "", .address = {}}) +
-                kTail);
+  EXPECT_EQ(ReadFile(path).value_or(""), kHead +
+                                             Table({.connote = "4021710012345",
+                                                    .items = "0",
+                                                    .kgs = "12",
+                                                    .reference = "PONo ",
+                                                    .start = "",
+                                                    .stop = "",
+                                                    .name = "",
+                                                    .address = {}}) +
+                                             kTail);
   // The account check is the despatch advice's.
   carrier->fields["AccountNumber"] = "40217-01";
   EXPECT_EQ(run.rows->Process(0, run.log), 0);

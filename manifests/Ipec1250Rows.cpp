@@ -1,0 +1,90 @@
+#include "manifests/Ipec1250Rows.h"
+
+#include "frame/host/Read.h"
+
+namespace quendal {
+
+Ipec1250Rows::Ipec1250Rows(const Ipec1250RowsVariant& variant)
+    : ConsolidatedManifestRows(variant.layout.className, variant.columns, variant.rowColumns,
+                               SummarySource::DateRange),
+      variant_(variant),
+      writer_(variant.layout, *this) {}
+
+Ref<host::ConNotes> Ipec1250Rows::QueryConNotes() {
+  return variant_.manifestRun ? ManifestConNotes() : TodaysConNotes();
+}
+
+void Ipec1250Rows::FillRow(Grid& rows, std::size_t row, const Ref<host::ConNote>& conNote) {
+  RowWriter::FillRow(rows, row, conNote);
+  if (!variant_.manifestRun) return;
+  rows(row, 4) = conNote->ConNoteDate();
+  rows(row, 5) = conNote->ScheduledDate();
+}
+
+void Ipec1250Rows::LogLine(long errorNumber, std::string_view procedure, std::string_view message) {
+  WriteLog(errorNumber, procedure, message);
+  if (errorLog_) errorLog_->push_back(LastLogId());
+}
+
+std::int32_t Ipec1250Rows::ProcessRow(Procedure& proc, const Ref<host::ConNote>& conNote,
+                                      LogList& vtErrorLog) {
+  std::int32_t result = 0;
+  errorLog_ = &vtErrorLog;
+  struct Done {
+    Ipec1250Rows& self;
+    ~Done() {
+      self.errorLog_ = nullptr;
+      self.writer_.Close();
+    }
+  } done{*this};
+
+  LayoutConsignment consignment;
+  if (!proc([&] {
+        consignment.conNote = conNote;
+        LogLine(0, "Process",
+                "ConNote " + conNote->ConNoteNo().Text() + ". ActiveX called " + ClassName());
+      }))
+    return result;
+  // The consignment's own packs and the notice of the first stand in for
+  // what the despatch step hands the despatch class.
+  if (!proc([&] {
+        consignment.packs = conNote->Packs();
+        consignment.asn = host::Read(host::First(consignment.packs), &host::Pack::ASN);
+        consignment.folder =
+            variant_.manifestRun
+                ? ediDocument_->OutputFolder().Text()
+                : host::Read(conNote->Carrier(), &host::Carrier::FileFolder).Text();
+      }))
+    return result;
+  if (variant_.manifestRun) {
+    bool saved = false;
+    if (!proc([&] { saved = SaveManifestRecord(); })) return result;
+    if (!proc([&] {
+          if (saved) return true;
+          LogLine(0, "Process", "Failed to create mainifest ID");
+          return false;
+        }))
+      return result;
+    if (!proc([&] { consignment.manifestNumber = manifest_->ManifestNumber(); })) return result;
+  }
+  // A consignment counts as manifested once its records are in the file.
+  const bool written = writer_.Write(proc, consignment, [&] {
+    if (!variant_.manifestRun) return true;
+    return proc([&] {
+      conNote->SetManifestId(manifest_->ManifestId());
+      conNote->Update(Var(8));
+    });
+  });
+  if (!written) return result;
+  proc([&] { result = ConNoteIdResult(conNote); });
+  return result;
+}
+
+bool Ipec1250Rows::TermWork(Procedure& proc) {
+  if (variant_.manifestRun) return true;
+  bool printed = false;
+  if (!proc([&] { printed = PrintTodaysSummary(); })) return false;
+  return printed;
+}
+
+}  // namespace quendal

@@ -95,7 +95,9 @@ std::string RenderDelimited(std::span<const Field> layout, std::span<const Var> 
     Var value;
     if (TakesValue(field) && next != values.end()) value = *next++;
     const std::string text = Fill(field, value);
-    if (text.find(delimiter) == std::string::npos && text.find('"') == std::string::npos) {
+    const bool quote = delimiter != '\t' && (text.find(delimiter) != std::string::npos ||
+                                              text.find('"') != std::string::npos);
+    if (!quote) {
       line += text;
       continue;
     }

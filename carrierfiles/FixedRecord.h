@@ -83,8 +83,8 @@ std::string Render(std::span<const Field> layout, std::span<const Var> values);
 
 // The fields filled as Render fills them, joined by `delimiter`. A value
 // holding the delimiter or a double quote is written in double quotes with
-// each quote doubled, so that it stays one column; a tab delimiter never
-// needs that, as tabs in values become spaces.
+// each quote doubled, so that it stays one column; with a tab delimiter
+// values are written as they stand, as tabs in values become spaces.
 std::string RenderDelimited(std::span<const Field> layout, std::span<const Var> values,
                             char delimiter);
 

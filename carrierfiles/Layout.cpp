@@ -130,6 +130,9 @@ std::vector<Token> Tokens(std::string_view line, int lineNo) {
       token.quoted = true;
       bool closed = false;
       for (++i; i < line.size(); ++i) {
+        const auto byte = static_cast<unsigned char>(line[i]);
+        if (byte < 0x20 || byte == 0x7F)
+          Fail(lineNo, static_cast<int>(i) + 1, "a quoted text may not hold a tab or other control character");
         if (line[i] != '"') {
           token.text += line[i];
           continue;

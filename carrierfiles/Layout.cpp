@@ -464,9 +464,19 @@ std::string RenderRecord(const Layout& layout, const LayoutRecord& record,
   Objects objects(values, pack);
   std::vector<Var> filled;
   filled.reserve(record.sources.size());
-  for (const ValueSource& source : record.sources)
-    filled.push_back(source.root == ValueRoot::Computed ? ComputedOf(source.computed, values, packNo)
-                                                        : objects.Get(source.root, source.member));
+  auto source = record.sources.begin();
+  for (const Field& field : record.fields) {
+    if (!record::TakesValue(field) || source == record.sources.end()) continue;
+    Var value = source->root == ValueRoot::Computed ? ComputedOf(source->computed, values, packNo)
+                                                    : objects.Get(source->root, source->member);
+    ++source;
+    // A fixed-width field keeps its width when the host has no value: a
+    // number missing counts as 0, a date missing is written as spaces.
+    if (!layout.delimited && field.kind == Kind::Number && !value.IsNumeric()) value = Var(0);
+    if (!layout.delimited && field.kind == Kind::Date && !host::DateOf(value))
+      value = Var(Spaces(field.width));
+    filled.push_back(std::move(value));
+  }
   return layout.delimited ? record::RenderDelimited(record.fields, filled, layout.delimiter)
                           : record::Render(record.fields, filled);
 }

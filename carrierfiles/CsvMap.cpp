@@ -109,8 +109,9 @@ std::string ShownText(std::string_view text) {
   return shown;
 }
 
-void AppendCsvValue(std::string& line, std::string_view value) {
-  if (value.find_first_of(",\"\r\n") == std::string_view::npos) {
+void AppendCsvValue(std::string& line, std::string_view value, char delimiter) {
+  if (value.find(delimiter) == std::string_view::npos &&
+      value.find_first_of("\"\r\n") == std::string_view::npos) {
     line.append(value);
     return;
   }

@@ -50,9 +50,9 @@ std::vector<std::string_view> SplitLines(std::string_view text);
 // most 40 characters followed by "..." when longer.
 std::string ShownText(std::string_view text);
 
-// Appends one value to a comma-separated line: as it stands, or in double
-// quotes with each quote doubled when it holds a comma, a double quote or a
+// Appends one value to a delimited line: as it stands, or in double quotes
+// with each quote doubled when it holds the delimiter, a double quote or a
 // line break, so that it stays one column.
-void AppendCsvValue(std::string& line, std::string_view value);
+void AppendCsvValue(std::string& line, std::string_view value, char delimiter = ',');
 
 }  // namespace quendal

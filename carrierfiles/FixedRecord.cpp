@@ -1,5 +1,6 @@
 #include "carrierfiles/FixedRecord.h"
 
+#include "carrierfiles/CsvMap.h"
 #include "frame/VB.h"
 
 namespace quendal::record {
@@ -95,18 +96,10 @@ std::string RenderDelimited(std::span<const Field> layout, std::span<const Var> 
     Var value;
     if (TakesValue(field) && next != values.end()) value = *next++;
     const std::string text = Fill(field, value);
-    const bool quote = delimiter != '\t' && (text.find(delimiter) != std::string::npos ||
-                                              text.find('"') != std::string::npos);
-    if (!quote) {
+    if (delimiter == '\t')
       line += text;
-      continue;
-    }
-    line += '"';
-    for (char c : text) {
-      if (c == '"') line += '"';
-      line += c;
-    }
-    line += '"';
+    else
+      AppendCsvValue(line, text, delimiter);
   }
   return line;
 }

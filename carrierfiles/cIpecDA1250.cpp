@@ -4,18 +4,7 @@ namespace quendal {
 
 namespace {
 
-// The first T1250 file created today takes the consignment, else a new one
-// named after the account and the time.
-constexpr LayoutVariant kVariant{
-    .className = "clsIpecDA1250",
-    .prefix = "T1250_",
-    .accountInName = true,
-    .stampMask = "YYYYMMDDHHMMSS",
-    .extension = ".DAT",
-    .reuseTodaysFile = true,
-    .serviceTable = ServiceTable::Ipec1250,
-    .writesTrailer = true,
-};
+constexpr LayoutVariant kVariant = Ipec1250File("clsIpecDA1250", true);
 
 }  // namespace
 

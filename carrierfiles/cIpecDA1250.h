@@ -4,10 +4,27 @@
 #pragma once
 
 #include <memory>
+#include <string_view>
 
 #include "carrierfiles/LayoutWriter.h"
 
 namespace quendal {
+
+// Ipec's 1250 file as the despatch, manifest and end-of-day classes write
+// it: the first T1250 file of the folder created today takes the
+// consignment, else a new one named after the account and the time.
+constexpr LayoutVariant Ipec1250File(std::string_view className, bool writesTrailer) {
+  return {
+      .className = className,
+      .prefix = "T1250_",
+      .accountInName = true,
+      .stampMask = "YYYYMMDDHHMMSS",
+      .extension = ".DAT",
+      .reuseTodaysFile = true,
+      .serviceTable = ServiceTable::Ipec1250,
+      .writesTrailer = writesTrailer,
+  };
+}
 
 class clsIpecDA1250 : public LayoutDespatch {
  public:

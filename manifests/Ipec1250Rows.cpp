@@ -22,20 +22,16 @@ void Ipec1250Rows::FillRow(Grid& rows, std::size_t row, const Ref<host::ConNote>
 }
 
 void Ipec1250Rows::LogLine(long errorNumber, std::string_view procedure, std::string_view message) {
-  WriteLog(errorNumber, procedure, message);
-  if (errorLog_) errorLog_->push_back(LastLogId());
+  LogRowLine(errorNumber, procedure, message);
 }
 
 std::int32_t Ipec1250Rows::ProcessRow(Procedure& proc, const Ref<host::ConNote>& conNote,
                                       LogList& vtErrorLog) {
   std::int32_t result = 0;
-  errorLog_ = &vtErrorLog;
+  const RowLog rowLog(*this, vtErrorLog);
   struct Done {
     Ipec1250Rows& self;
-    ~Done() {
-      self.errorLog_ = nullptr;
-      self.writer_.Close();
-    }
+    ~Done() { self.writer_.Close(); }
   } done{*this};
 
   LayoutConsignment consignment;
@@ -57,14 +53,7 @@ std::int32_t Ipec1250Rows::ProcessRow(Procedure& proc, const Ref<host::ConNote>&
       }))
     return result;
   if (variant_.manifestRun) {
-    bool saved = false;
-    if (!proc([&] { saved = SaveManifestRecord(); })) return result;
-    if (!proc([&] {
-          if (saved) return true;
-          LogLine(0, "Process", "Failed to create mainifest ID");
-          return false;
-        }))
-      return result;
+    if (!ManifestRecordSteps(proc, "Failed to create mainifest ID")) return result;
     if (!proc([&] { consignment.manifestNumber = manifest_->ManifestNumber(); })) return result;
   }
   // A consignment counts as manifested once its records are in the file.

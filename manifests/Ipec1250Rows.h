@@ -43,9 +43,6 @@ class Ipec1250Rows : public ConsolidatedManifestRows, private LayoutWriter::Owne
 
   const Ipec1250RowsVariant& variant_;
   LayoutWriter writer_;
-  // The caller's list while a row runs: it keeps what it held and gets each
-  // entry's id as the entry is written.
-  LogList* errorLog_ = nullptr;
 };
 
 }  // namespace quendal

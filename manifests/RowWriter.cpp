@@ -166,6 +166,21 @@ std::int32_t RowWriter::ConNoteIdResult(const Ref<host::ConNote>& conNote) {
   return id >= INT32_MIN && id <= INT32_MAX ? static_cast<std::int32_t>(id) : 0;
 }
 
+void RowWriter::LogRowLine(long errorNumber, std::string_view procedure, std::string_view message) {
+  WriteLog(errorNumber, procedure, message);
+  if (rowLog_) rowLog_->push_back(LastLogId());
+}
+
+bool RowWriter::ManifestRecordSteps(Procedure& proc, std::string_view failure) {
+  bool saved = false;
+  if (!proc([&] { saved = SaveManifestRecord(); })) return false;
+  return proc([&] {
+    if (saved) return true;
+    LogRowLine(0, "Process", failure);
+    return false;
+  });
+}
+
 bool RowWriter::SaveManifestRecord() {
   if (manifest_->ManifestId().NumberOr(0) != 0) return true;
   manifest_->SetVendorId(ediDocument_->VendorId());

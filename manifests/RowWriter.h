@@ -39,6 +39,18 @@ inline constexpr std::array<GridColumn, 5> kConsignmentColumns = {{
     {"Result", 0, 3000},
 }};
 
+// The grid of the manifest runs: number, partner, delivery location,
+// service and run, the shipped and scheduled dates and the row's result.
+inline constexpr std::array<GridColumn, 7> kManifestColumns = {{
+    {"ConNote No", 0, 2200},
+    {"Partner", 2, 2000},
+    {"Delivery Locn", 0, 2000},
+    {"Service-Run Code", 0, 2000},
+    {"Shipped Date", 0, 2600},
+    {"Sheduled Date", 0, 2600},
+    {"Result", 0, 3000},
+}};
+
 class RowWriter : public virtual RowInterface, public Lifecycle {
  public:
   bool Init(const Ref<host::System>& system, std::int16_t EDIDocId, Grid& Columns) override;
@@ -72,6 +84,25 @@ class RowWriter : public virtual RowInterface, public Lifecycle {
   // it, once per object; true when the record has an id.
   bool SaveManifestRecord();
 
+  // Writes one host log entry and, while a row runs, appends its id to the
+  // row's caller's list at once, so the caller sees every entry even when
+  // the row ends early.
+  void LogRowLine(long errorNumber, std::string_view procedure, std::string_view message);
+  // Names the caller's list of the row that runs while it lives.
+  class RowLog {
+   public:
+    RowLog(RowWriter& writer, LogList& list) : writer_(writer) { writer_.rowLog_ = &list; }
+    ~RowLog() { writer_.rowLog_ = nullptr; }
+    RowLog(const RowLog&) = delete;
+    RowLog& operator=(const RowLog&) = delete;
+
+   private:
+    RowWriter& writer_;
+  };
+  // Steps of a manifest run's row: the run's manifest record gets its id on
+  // the first row; when it can't, `failure` is logged and false ends the row.
+  bool ManifestRecordSteps(Procedure& proc, std::string_view failure);
+
   std::size_t RowCount() const { return conNotes_.size(); }
 
   // The consignment's id as a row's result; 0 when the 32-bit result
@@ -88,6 +119,7 @@ class RowWriter : public virtual RowInterface, public Lifecycle {
  private:
   std::span<const GridColumn> columns_;
   std::size_t rowColumns_;
+  LogList* rowLog_ = nullptr;
   // The loaded consignments in row order; row i is conNotes_[i].
   std::vector<Ref<host::ConNote>> conNotes_;
 };

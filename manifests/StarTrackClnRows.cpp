@@ -32,20 +32,16 @@ void StarTrackClnRows::FillRow(Grid& rows, std::size_t row, const Ref<host::ConN
 
 void StarTrackClnRows::LogLine(long errorNumber, std::string_view procedure,
                                std::string_view message) {
-  WriteLog(errorNumber, procedure, message);
-  if (errorLog_) errorLog_->push_back(LastLogId());
+  LogRowLine(errorNumber, procedure, message);
 }
 
 std::int32_t StarTrackClnRows::ProcessRow(Procedure& proc, const Ref<host::ConNote>& conNote,
                                           LogList& vtErrorLog) {
   std::int32_t result = 0;
-  errorLog_ = &vtErrorLog;
+  const RowLog rowLog(*this, vtErrorLog);
   struct Done {
     StarTrackClnRows& self;
-    ~Done() {
-      self.errorLog_ = nullptr;
-      self.cln_.Close();
-    }
+    ~Done() { self.cln_.Close(); }
   } done{*this};
 
   ClnConsignment consignment;
@@ -63,14 +59,7 @@ std::int32_t StarTrackClnRows::ProcessRow(Procedure& proc, const Ref<host::ConNo
       }))
     return result;
   if (variant_.manifestRun) {
-    bool saved = false;
-    if (!proc([&] { saved = SaveManifestRecord(); })) return result;
-    if (!proc([&] {
-          if (saved) return true;
-          LogLine(0, "Process", "Failed to create manifest ID");
-          return false;
-        }))
-      return result;
+    if (!ManifestRecordSteps(proc, "Failed to create manifest ID")) return result;
     if (!proc([&] { consignment.manifestNumber = manifest_->ManifestNumber(); })) return result;
   }
   // A consignment counts as manifested once its records are in the file.

@@ -51,9 +51,6 @@ class StarTrackClnRows : public ConsolidatedManifestRows, private ClnWriter::Own
 
   const StarTrackRowsVariant& variant_;
   ClnWriter cln_;
-  // The caller's list while a row runs: it keeps what it held and gets each
-  // entry's id as the entry is written, as the despatch class's does.
-  LogList* errorLog_ = nullptr;
 };
 
 }  // namespace quendal

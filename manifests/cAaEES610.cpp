@@ -36,8 +36,7 @@ constexpr LayoutVariant kVariant{
 clsAaEES610::clsAaEES610() : RowWriter(kVariant.className, kColumns, 5), writer_(kVariant, *this) {}
 
 void clsAaEES610::LogLine(long errorNumber, std::string_view procedure, std::string_view message) {
-  WriteLog(errorNumber, procedure, message);
-  if (errorLog_) errorLog_->push_back(LastLogId());
+  LogRowLine(errorNumber, procedure, message);
 }
 
 std::int32_t clsAaEES610::Load(const std::string& a_sFileName, Grid& a_vtRows) {
@@ -94,13 +93,10 @@ std::int32_t clsAaEES610::Load(const std::string& a_sFileName, Grid& a_vtRows) {
 std::int32_t clsAaEES610::Process(std::int32_t a_lRowNum, LogList& vtErrorLog) {
   std::int32_t result = 0;
   Procedure proc = Guard("Function Process");
-  errorLog_ = &vtErrorLog;
+  const RowLog rowLog(*this, vtErrorLog);
   struct Done {
     clsAaEES610& self;
-    ~Done() {
-      self.errorLog_ = nullptr;
-      self.writer_.Close();
-    }
+    ~Done() { self.writer_.Close(); }
   } done{*this};
   PackRow row;
   if (!proc([&] {

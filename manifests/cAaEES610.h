@@ -36,7 +36,6 @@ class clsAaEES610 : public RowWriter, private LayoutWriter::Owner {
   };
   std::vector<PackRow> rows_;
   LayoutWriter writer_;
-  LogList* errorLog_ = nullptr;
 };
 
 std::unique_ptr<Component> MakeAaEES610();

@@ -1,5 +1,7 @@
 #include "manifests/cIpecDA1250EOD.h"
 
+#include "carrierfiles/cIpecDA1250.h"
+
 namespace quendal {
 
 namespace {
@@ -9,17 +11,7 @@ constexpr Ipec1250RowsVariant kEndOfDay{
     .manifestRun = false,
     .columns = kConsignmentColumns,
     .rowColumns = 6,
-    .layout =
-        {
-            .className = "clsIpecDA1250EOD",
-            .prefix = "T1250_",
-            .accountInName = true,
-            .stampMask = "YYYYMMDDHHMMSS",
-            .extension = ".DAT",
-            .reuseTodaysFile = true,
-            .serviceTable = ServiceTable::Ipec1250,
-            .writesTrailer = true,
-        },
+    .layout = Ipec1250File("clsIpecDA1250EOD", true),
 };
 
 }  // namespace

@@ -1,38 +1,18 @@
 #include "manifests/cIpecDA1250Manifest.h"
 
-#include <array>
+#include "carrierfiles/cIpecDA1250.h"
 
 namespace quendal {
 
 namespace {
 
-constexpr std::array<GridColumn, 7> kColumns = {{
-    {"ConNote No", 0, 2200},
-    {"Partner", 2, 2000},
-    {"Delivery Locn", 0, 2000},
-    {"Service-Run Code", 0, 2000},
-    {"Shipped Date", 0, 2600},
-    {"Sheduled Date", 0, 2600},
-    {"Result", 0, 3000},
-}};
-
 // The day's 1250 file of the output folder; the run adds no trailer, but
 // keeps last one the file already ends with.
 constexpr Ipec1250RowsVariant kManifestRun{
     .manifestRun = true,
-    .columns = kColumns,
+    .columns = kManifestColumns,
     .rowColumns = 7,
-    .layout =
-        {
-            .className = "clsIpecDA1250Manifest",
-            .prefix = "T1250_",
-            .accountInName = true,
-            .stampMask = "YYYYMMDDHHMMSS",
-            .extension = ".DAT",
-            .reuseTodaysFile = true,
-            .serviceTable = ServiceTable::Ipec1250,
-            .writesTrailer = false,
-        },
+    .layout = Ipec1250File("clsIpecDA1250Manifest", false),
 };
 
 }  // namespace

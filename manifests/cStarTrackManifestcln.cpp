@@ -1,20 +1,8 @@
 #include "manifests/cStarTrackManifestcln.h"
 
-#include <array>
-
 namespace quendal {
 
 namespace {
-
-constexpr std::array<GridColumn, 7> kColumns = {{
-    {"ConNote No", 0, 2200},
-    {"Partner", 2, 2000},
-    {"Delivery Locn", 0, 2000},
-    {"Service-Run Code", 0, 2000},
-    {"Shipped Date", 0, 2600},
-    {"Sheduled Date", 0, 2600},
-    {"Result", 0, 3000},
-}};
 
 // Every consignment of a manifest goes to the file named after its number,
 // even when another file was started today; a consignment without a
@@ -22,7 +10,7 @@ constexpr std::array<GridColumn, 7> kColumns = {{
 constexpr StarTrackRowsVariant kManifestRun{
     .className = "clsStarTrackManifestcln",
     .manifestRun = true,
-    .columns = kColumns,
+    .columns = kManifestColumns,
     .rowColumns = 7,
     .cln =
         {

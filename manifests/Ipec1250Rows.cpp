@@ -5,21 +5,10 @@
 namespace quendal {
 
 Ipec1250Rows::Ipec1250Rows(const Ipec1250RowsVariant& variant)
-    : ConsolidatedManifestRows(variant.layout.className, variant.columns, variant.rowColumns,
-                               SummarySource::DateRange),
+    : ConsignmentFileRows(variant.layout.className, variant.columns, variant.rowColumns,
+                          SummarySource::DateRange, variant.manifestRun),
       variant_(variant),
       writer_(variant.layout, *this) {}
-
-Ref<host::ConNotes> Ipec1250Rows::QueryConNotes() {
-  return variant_.manifestRun ? ManifestConNotes() : TodaysConNotes();
-}
-
-void Ipec1250Rows::FillRow(Grid& rows, std::size_t row, const Ref<host::ConNote>& conNote) {
-  RowWriter::FillRow(rows, row, conNote);
-  if (!variant_.manifestRun) return;
-  rows(row, 4) = conNote->ConNoteDate();
-  rows(row, 5) = conNote->ScheduledDate();
-}
 
 void Ipec1250Rows::LogLine(long errorNumber, std::string_view procedure, std::string_view message) {
   LogRowLine(errorNumber, procedure, message);
@@ -35,21 +24,12 @@ std::int32_t Ipec1250Rows::ProcessRow(Procedure& proc, const Ref<host::ConNote>&
   } done{*this};
 
   LayoutConsignment consignment;
+  consignment.conNote = conNote;
+  if (!OpenRow(proc, conNote, consignment.packs, consignment.asn)) return result;
   if (!proc([&] {
-        consignment.conNote = conNote;
-        LogLine(0, "Process",
-                "ConNote " + conNote->ConNoteNo().Text() + ". ActiveX called " + ClassName());
-      }))
-    return result;
-  // The consignment's own packs and the notice of the first stand in for
-  // what the despatch step hands the despatch class.
-  if (!proc([&] {
-        consignment.packs = conNote->Packs();
-        consignment.asn = host::Read(host::First(consignment.packs), &host::Pack::ASN);
         consignment.folder =
-            variant_.manifestRun
-                ? ediDocument_->OutputFolder().Text()
-                : host::Read(conNote->Carrier(), &host::Carrier::FileFolder).Text();
+            variant_.manifestRun ? ediDocument_->OutputFolder().Text()
+                                 : host::Read(conNote->Carrier(), &host::Carrier::FileFolder).Text();
       }))
     return result;
   if (variant_.manifestRun) {

@@ -25,12 +25,10 @@ struct Ipec1250RowsVariant {
   LayoutVariant layout;
 };
 
-class Ipec1250Rows : public ConsolidatedManifestRows, private LayoutWriter::Owner {
+class Ipec1250Rows : public ConsignmentFileRows, private LayoutWriter::Owner {
  protected:
   explicit Ipec1250Rows(const Ipec1250RowsVariant& variant);
 
-  Ref<host::ConNotes> QueryConNotes() override;
-  void FillRow(Grid& rows, std::size_t row, const Ref<host::ConNote>& conNote) override;
   std::int32_t ProcessRow(Procedure& proc, const Ref<host::ConNote>& conNote,
                           LogList& vtErrorLog) override;
   bool TermWork(Procedure& proc) override;

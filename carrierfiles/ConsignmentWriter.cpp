@@ -154,26 +154,25 @@ std::string ConsignmentWriter::FormatText(std::string_view text, long length, bo
   return rightAlign ? fill + cut : cut + fill;
 }
 
+std::string ServiceCodeOf(ServiceTable table, const Ref<host::ConNote>& conNote) {
+  const std::string service = Trim(conNote->Service().Text());
+  switch (table) {
+    case ServiceTable::Ipec1250:
+      return Lookup(kIpec1250, "", UCase(service));
+    case ServiceTable::Ipec1256:
+      return Lookup(kIpec1256, "", UCase(service));
+    case ServiceTable::Hunter:
+      return Lookup(kHunter, "", service);
+    case ServiceTable::TNTET11:
+      return Lookup(kTNTET11, Left(conNote->CarrierPrefix().Text(), 3), service);
+  }
+  return {};
+}
+
 std::string ConsignmentWriter::ServiceCode(ServiceTable table, const Ref<host::ConNote>& conNote) {
   std::string result;
   Procedure proc = Guard("Function ServiceCode");
-  proc([&] {
-    const std::string service = Trim(conNote->Service().Text());
-    switch (table) {
-      case ServiceTable::Ipec1250:
-        result = Lookup(kIpec1250, "", UCase(service));
-        break;
-      case ServiceTable::Ipec1256:
-        result = Lookup(kIpec1256, "", UCase(service));
-        break;
-      case ServiceTable::Hunter:
-        result = Lookup(kHunter, "", service);
-        break;
-      case ServiceTable::TNTET11:
-        result = Lookup(kTNTET11, Left(conNote->CarrierPrefix().Text(), 3), service);
-        break;
-    }
-  });
+  proc([&] { result = ServiceCodeOf(table, conNote); });
   return result;
 }
 
@@ -210,26 +209,27 @@ std::int32_t ConsignmentWriter::WriteFile(const std::string& path) {
   return result;
 }
 
+double ShipmentWeightOf(const Ref<host::PackList>& packs) {
+  double total = 0;
+  if (!packs) return total;
+  for (Ref<host::Pack> pack : *packs) {
+    if (!pack) continue;
+    if (Ref<host::Carton> carton = pack->Carton()) {
+      const Var weight = carton->Weight();
+      if (weight.IsNumeric() && weight.Number() > 0) {
+        total += weight.Number();
+        continue;
+      }
+    }
+    total += pack->Weight().NumberOr(0);
+  }
+  return total;
+}
+
 double ConsignmentWriter::TotalShipmentWeight(const Ref<host::PackList>& packs) {
   double result = 0;
   Procedure proc = Guard("Function TotalShipmentWeight");
-  proc([&] {
-    double total = 0;
-    if (packs) {
-      for (Ref<host::Pack> pack : *packs) {
-        if (!pack) continue;
-        if (Ref<host::Carton> carton = pack->Carton()) {
-          const Var weight = carton->Weight();
-          if (weight.IsNumeric() && weight.Number() > 0) {
-            total += weight.Number();
-            continue;
-          }
-        }
-        total += pack->Weight().NumberOr(0);
-      }
-    }
-    result = total;
-  });
+  proc([&] { result = ShipmentWeightOf(packs); });
   return result;
 }
 

@@ -23,6 +23,12 @@ inline constexpr char kFolderSeparator = '/';
 // A carrier folder exists and its text ends with the folder separator.
 bool IsCarrierFolder(const std::string& folder);
 
+// The carrier's code for the consignment's service (no guard of its own).
+std::string ServiceCodeOf(ServiceTable table, const Ref<host::ConNote>& conNote);
+// Sum over the packs of the carton weight when above 0, else the pack
+// weight (no guard of its own).
+double ShipmentWeightOf(const Ref<host::PackList>& packs);
+
 class ConsignmentWriter : public Lifecycle, public ConsignmentInterface {
  public:
   void Process(const Ref<host::System>& objSystem, const Ref<host::ConNote>& objConNote,

@@ -11,41 +11,6 @@ namespace {
 // flood the host's log.
 constexpr std::size_t kNotesShown = 10;
 
-// The bytes as single-byte text: a UTF-8 byte-order mark is dropped, and
-// UTF-16 (marked by its byte-order mark) becomes ASCII with "?" for
-// anything else, which no field name holds.
-std::string Decode(std::string_view bytes) {
-  if (bytes.starts_with("\xEF\xBB\xBF")) return std::string(bytes.substr(3));
-  const bool little = bytes.starts_with("\xFF\xFE");
-  if (!little && !bytes.starts_with("\xFE\xFF")) return std::string(bytes);
-  std::string text;
-  text.reserve(bytes.size() / 2);
-  for (std::size_t i = 2; i + 1 < bytes.size(); i += 2) {
-    const auto first = static_cast<unsigned char>(bytes[i]);
-    const auto second = static_cast<unsigned char>(bytes[i + 1]);
-    const unsigned unit = little ? first | second << 8 : first << 8 | second;
-    text += unit < 0x80 ? static_cast<char>(unit) : '?';
-  }
-  return text;
-}
-
-// Lines ended by CR LF, LF or CR; the last line counts without an ending.
-std::vector<std::string_view> Lines(std::string_view text) {
-  std::vector<std::string_view> lines;
-  std::size_t start = 0;
-  while (start < text.size()) {
-    const std::size_t end = text.find_first_of("\r\n", start);
-    if (end == std::string_view::npos) {
-      lines.push_back(text.substr(start));
-      break;
-    }
-    lines.push_back(text.substr(start, end - start));
-    start = end + 1;
-    if (text[end] == '\r' && start < text.size() && text[start] == '\n') ++start;
-  }
-  return lines;
-}
-
 std::string_view TrimBlanks(std::string_view text) {
   const std::size_t first = text.find_first_not_of(" \t");
   if (first == std::string_view::npos) return {};
@@ -61,9 +26,40 @@ std::string AsciiUpper(std::string_view text) {
 
 }  // namespace
 
+std::string DecodeHandEdited(std::string_view bytes) {
+  if (bytes.starts_with("\xEF\xBB\xBF")) return std::string(bytes.substr(3));
+  const bool little = bytes.starts_with("\xFF\xFE");
+  if (!little && !bytes.starts_with("\xFE\xFF")) return std::string(bytes);
+  std::string text;
+  text.reserve(bytes.size() / 2);
+  for (std::size_t i = 2; i + 1 < bytes.size(); i += 2) {
+    const auto first = static_cast<unsigned char>(bytes[i]);
+    const auto second = static_cast<unsigned char>(bytes[i + 1]);
+    const unsigned unit = little ? first | second << 8 : first << 8 | second;
+    text += unit < 0x80 ? static_cast<char>(unit) : '?';
+  }
+  return text;
+}
+
+std::vector<std::string_view> SplitLines(std::string_view text) {
+  std::vector<std::string_view> lines;
+  std::size_t start = 0;
+  while (start < text.size()) {
+    const std::size_t end = text.find_first_of("\r\n", start);
+    if (end == std::string_view::npos) {
+      lines.push_back(text.substr(start));
+      break;
+    }
+    lines.push_back(text.substr(start, end - start));
+    start = end + 1;
+    if (text[end] == '\r' && start < text.size() && text[start] == '\n') ++start;
+  }
+  return lines;
+}
+
 CsvMap ReadCsvMap(std::string_view bytes, std::span<const std::string_view> catalogue) {
-  const std::string text = Decode(bytes);
-  const std::vector<std::string_view> lines = Lines(text);
+  const std::string text = DecodeHandEdited(bytes);
+  const std::vector<std::string_view> lines = SplitLines(text);
   std::size_t used = lines.size();
   while (used > 0 && TrimBlanks(lines[used - 1]).empty()) --used;
 
@@ -113,8 +109,9 @@ std::string ShownText(std::string_view text) {
   return shown;
 }
 
-void AppendCsvValue(std::string& line, std::string_view value) {
-  if (value.find_first_of(",\"\r\n") == std::string_view::npos) {
+void AppendCsvValue(std::string& line, std::string_view value, char delimiter) {
+  if (value.find(delimiter) == std::string_view::npos &&
+      value.find_first_of("\"\r\n") == std::string_view::npos) {
     line.append(value);
     return;
   }

@@ -38,13 +38,21 @@ struct CsvMap {
 // (upper case). An unknown name is noted once however often it appears.
 CsvMap ReadCsvMap(std::string_view bytes, std::span<const std::string_view> catalogue);
 
+// The bytes of a hand-edited file as single-byte text: a UTF-8 byte-order
+// mark is dropped, and UTF-16 (marked by its byte-order mark) becomes ASCII
+// with "?" for anything else, which no name in such a file holds.
+std::string DecodeHandEdited(std::string_view bytes);
+
+// Lines ended by CR LF, LF or CR; the last line counts without an ending.
+std::vector<std::string_view> SplitLines(std::string_view text);
+
 // A text as a log line may show it: printable ASCII (others become "?"), at
 // most 40 characters followed by "..." when longer.
 std::string ShownText(std::string_view text);
 
-// Appends one value to a comma-separated line: as it stands, or in double
-// quotes with each quote doubled when it holds a comma, a double quote or a
+// Appends one value to a delimited line: as it stands, or in double quotes
+// with each quote doubled when it holds the delimiter, a double quote or a
 // line break, so that it stays one column.
-void AppendCsvValue(std::string& line, std::string_view value);
+void AppendCsvValue(std::string& line, std::string_view value, char delimiter = ',');
 
 }  // namespace quendal

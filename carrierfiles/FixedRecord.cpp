@@ -1,5 +1,6 @@
 #include "carrierfiles/FixedRecord.h"
 
+#include "carrierfiles/CsvMap.h"
 #include "frame/VB.h"
 
 namespace quendal::record {
@@ -24,9 +25,8 @@ std::string PadLeft(std::string text, int width) {
   return text;
 }
 
-}  // namespace
-
-std::string Fill(const Field& field, const Var& value) {
+// The field's text for the value, before any blank text is put in its place.
+std::string Filled(const Field& field, const Var& value) {
   switch (field.kind) {
     case Kind::Literal:
       return std::string(field.text);
@@ -38,6 +38,8 @@ std::string Fill(const Field& field, const Var& value) {
       return PadLeft(Clean(value.Text()), field.width);
     case Kind::CutLeft:
       return PadRight(Left(Clean(value.Text()), field.width), field.width);
+    case Kind::CutRight:
+      return PadLeft(Left(Clean(value.Text()), field.width), field.width);
     case Kind::Zero: {
       const std::int64_t whole = RoundHalfEven(value.NumberOr(0));
       return Format(Var(whole), std::string(static_cast<std::size_t>(field.width), '0'));
@@ -49,16 +51,55 @@ std::string Fill(const Field& field, const Var& value) {
   return {};
 }
 
+bool IsBlank(const Field& field, const Var& value) {
+  if (value.IsNull() || Trim(value.Text()).empty()) return true;
+  if (field.kind != Kind::Zero && field.kind != Kind::Number) return false;
+  return !value.IsNumeric() || Filled(field, value) == Filled(field, Var(0));
+}
+
+}  // namespace
+
+std::string Fill(const Field& field, const Var& value) {
+  if (field.hasBlank && TakesValue(field) && IsBlank(field, value)) return std::string(field.blank);
+  const bool text = field.kind == Kind::TextLeft || field.kind == Kind::TextRight ||
+                    field.kind == Kind::CutLeft || field.kind == Kind::CutRight;
+  if (field.upper && text) return Filled(field, Var(UCase(value.Text())));
+  return Filled(field, value);
+}
+
 std::string Render(std::span<const Field> layout, std::initializer_list<Var> values) {
+  return Render(layout, std::span<const Var>(values.begin(), values.size()));
+}
+
+std::string Render(std::span<const Field> layout, std::span<const Var> values) {
   std::string line;
   line.reserve(static_cast<std::size_t>(Width(layout)));
-  const Var* next = values.begin();
+  auto next = values.begin();
   for (const Field& field : layout) {
     if (!TakesValue(field)) {
       line += Fill(field, Var());
       continue;
     }
     line += Fill(field, next != values.end() ? *next++ : Var());
+  }
+  return line;
+}
+
+std::string RenderDelimited(std::span<const Field> layout, std::span<const Var> values,
+                            char delimiter) {
+  std::string line;
+  auto next = values.begin();
+  bool first = true;
+  for (const Field& field : layout) {
+    if (!first) line += delimiter;
+    first = false;
+    Var value;
+    if (TakesValue(field) && next != values.end()) value = *next++;
+    const std::string text = Fill(field, value);
+    if (delimiter == '\t')
+      line += text;
+    else
+      AppendCsvValue(line, text, delimiter);
   }
   return line;
 }

@@ -1,12 +1,15 @@
-// Fixed-width carrier records declared as a list of fields and rendered to
-// one line. A layout is a constexpr array of fields; the values of the
-// fields that take one are handed over in layout order.
+// Carrier records declared as a list of fields and rendered to one line. A
+// layout is a constexpr array of fields (or a list read from a layout file
+// at run time); the values of the fields that take one are handed over in
+// layout order.
 //
 //   constexpr std::array kItem = {Literal("20"), TextLeft(20), TextLeft(0)};
 //   std::string line = Render(kItem, {conNoteNo, sscc});
 //
 // Fill rules never cut: a value longer than its field is written whole and
-// shifts the rest of the line. Only CutLeft takes the first characters.
+// shifts the rest of the line. Only CutLeft and CutRight take the first
+// characters. A delimited record joins the filled fields with a delimiter
+// instead of setting them side by side.
 #pragma once
 
 #include <cstdint>
@@ -25,6 +28,7 @@ enum class Kind : std::uint8_t {
   TextLeft,   // the value, padded with spaces on the right to `width`
   TextRight,  // the value, padded with spaces on the left to `width`
   CutLeft,    // the first `width` characters of the value, padded on the right
+  CutRight,   // the first `width` characters of the value, padded on the left
   Zero,       // the value as a whole number, zero-filled on the left to `width` digits
   Date,       // the value formatted with the mask; a missing date is empty
   Number,     // the number formatted with the mask ("00000.000")
@@ -34,6 +38,11 @@ struct Field {
   Kind kind;
   int width;              // characters the field takes when the value fits
   std::string_view text;  // the literal, or the date mask
+  // Written instead of the filled value when the value is missing: Null,
+  // blank text, or a number the field writes as it writes 0.
+  std::string_view blank = {};
+  bool hasBlank = false;
+  bool upper = false;  // the value is upper-cased before it is filled
 };
 
 constexpr Field Literal(std::string_view text) {
@@ -43,6 +52,7 @@ constexpr Field Spaces(int width) { return {Kind::Spaces, width, {}}; }
 constexpr Field TextLeft(int width) { return {Kind::TextLeft, width, {}}; }
 constexpr Field TextRight(int width) { return {Kind::TextRight, width, {}}; }
 constexpr Field CutLeft(int width) { return {Kind::CutLeft, width, {}}; }
+constexpr Field CutRight(int width) { return {Kind::CutRight, width, {}}; }
 constexpr Field Zero(int width) { return {Kind::Zero, width, {}}; }
 // Masks whose output is as long as the mask ("YYYYMMDDHHMMSS", "DD-MMM-YYYY  ").
 constexpr Field Date(std::string_view mask) {
@@ -69,6 +79,14 @@ constexpr int Width(std::span<const Field> layout) {
 // in values (line breaks, tabs) become spaces: a value must never split or
 // skew a record.
 std::string Render(std::span<const Field> layout, std::initializer_list<Var> values);
+std::string Render(std::span<const Field> layout, std::span<const Var> values);
+
+// The fields filled as Render fills them, joined by `delimiter`. A value
+// holding the delimiter or a double quote is written in double quotes with
+// each quote doubled, so that it stays one column; with a tab delimiter
+// values are written as they stand, as tabs in values become spaces.
+std::string RenderDelimited(std::span<const Field> layout, std::span<const Var> values,
+                            char delimiter);
 
 // One field on its own, for values that are put together before they go in.
 std::string Fill(const Field& field, const Var& value);

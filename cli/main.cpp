@@ -13,6 +13,7 @@
 
 #include "cli/Cli.h"
 #include "cli/Demo.h"
+#include "cli/Layouts.h"
 #include "cli/Prompt.h"
 #include "cli/Work.h"
 #include "frame/VB.h"
@@ -569,6 +570,21 @@ int Main(int argc, char** argv) {
       ->capture_default_str();
   report->add_option("--edi-doc", o.ediDoc, "EDI document to Init the class with (default: none)");
 
+  auto* layout = app.add_subcommand("layout", "the carrier layout a class uses; validate a site layout");
+  layout->require_subcommand(1, 1);
+  auto* layoutShow = layout->add_subcommand("show", "print the layout the library ships for a class");
+  layoutShow->add_option("CLASS", o.className, "class laid out by a layout file")->required();
+  auto* layoutCheck = layout->add_subcommand(
+      "check", "check a layout file and show what it writes for a sample consignment");
+  layoutCheck->add_option("FILE", o.file, "layout file")->required();
+  layoutCheck->add_option("--class", o.className,
+                          "the class it is meant for (default: the class the file is named after)");
+  layout->footer(
+      "A site layout lies beside the carrier's output as CLASS.layout and replaces the layout the "
+      "library ships. check prints the problem of a file that can't be used (FILE line L column C) "
+      "and exits 1; for a sound file it runs the class on a sample consignment in a scratch folder "
+      "and prints the records written and the log.");
+
   auto* demo = app.add_subcommand("demo", "a demo day in a fresh database, running every built class");
   demo->add_option("--out", o.out, "demo folder")->capture_default_str();
 
@@ -613,6 +629,10 @@ int Main(int argc, char** argv) {
       SetSpooler(spooler);
     }
 
+    if (*layout) {
+      if (layoutShow->parsed()) return LayoutShow(o.className, std::cout, o.json);
+      return LayoutCheck(o.file, o.className, std::cout, o.json);
+    }
     Command command(o);
     if (*classes) return command.Classes();
     if (*import) return command.Import();

@@ -20,6 +20,13 @@ std::unique_ptr<Component> MakeVLODAcsv();
 std::unique_ptr<Component> MakeTNTTransactionDAcsv();
 std::unique_ptr<Component> MakeDFEDAxml();
 std::unique_ptr<Component> MakeDFEDAManifestxml();
+std::unique_ptr<Component> MakeMayneDAcl();
+std::unique_ptr<Component> MakeIpecDA1250();
+std::unique_ptr<Component> MakeIpecDA1256();
+std::unique_ptr<Component> MakeHunterDA();
+std::unique_ptr<Component> MakeAaEES610();
+std::unique_ptr<Component> MakeIpecDA1250Manifest();
+std::unique_ptr<Component> MakeIpecDA1250EOD();
 
 namespace {
 
@@ -32,12 +39,12 @@ constexpr std::array kCatalogue = {
     CatalogueEntry{"clsStarTrackCMLSCM", Label, "StarTrack", "CML", nullptr},
     CatalogueEntry{"clsTNTCMLSCM", Label, "TNT", "CML", nullptr},
     CatalogueEntry{"clsStarTrackDJsSCM", Label, "StarTrack", "David Jones", nullptr},
-    CatalogueEntry{"clsMayneDAcl", Consignment, "Mayne", "CL file", nullptr},
+    CatalogueEntry{"clsMayneDAcl", Consignment, "Mayne", "CL file", MakeMayneDAcl},
     CatalogueEntry{"clsMayneCMLSCMLSCP", Label, "Mayne", "CML", nullptr},
     CatalogueEntry{"clsMayneDJsSCM", Label, "Mayne", "David Jones", nullptr},
-    CatalogueEntry{"clsIpecDA1250", Consignment, "Ipec", "1250 file", nullptr},
+    CatalogueEntry{"clsIpecDA1250", Consignment, "Ipec", "1250 file", MakeIpecDA1250},
     CatalogueEntry{"clsStarTrackBLSCM", Label, "StarTrack", "BL", nullptr},
-    CatalogueEntry{"clsIpecDA1256", Consignment, "Ipec", "1256 file", nullptr},
+    CatalogueEntry{"clsIpecDA1256", Consignment, "Ipec", "1256 file", MakeIpecDA1256},
     CatalogueEntry{"clsVicExpressDAcln", Consignment, "VicExpress", "consignment file (\".CTN\")",
                    MakeVicExpressDAcln},
     CatalogueEntry{"clsVLODAcsv", Consignment, "VLO", "map-driven CSV file", MakeVLODAcsv},
@@ -47,11 +54,11 @@ constexpr std::array kCatalogue = {
                    MakeStarTrackGenericSCM},
     CatalogueEntry{"clsTollGenericSCM", Label, "Toll", "any retailer", nullptr},
     CatalogueEntry{"clsAaEGenericSCM", Label, "AaE", "any retailer", nullptr},
-    CatalogueEntry{"clsAaEES610", Rows, "AaE", "ES610 file", nullptr},
+    CatalogueEntry{"clsAaEES610", Rows, "AaE", "ES610 file", MakeAaEES610},
     CatalogueEntry{"clsDFEDAxml", Consignment, "DFE",
                    "XML despatch advice, dangerous goods declaration", MakeDFEDAxml},
     CatalogueEntry{"clsDFESCM", Label, "DFE", "any retailer", nullptr},
-    CatalogueEntry{"clsHunterDA", Consignment, "Hunter", "despatch file", nullptr},
+    CatalogueEntry{"clsHunterDA", Consignment, "Hunter", "despatch file", MakeHunterDA},
     CatalogueEntry{"clsHunterGenericSCM", Label, "Hunter", "any retailer", nullptr},
     CatalogueEntry{"clsStarTrackBigWSCM", Label, "StarTrack", "BigW", nullptr},
     CatalogueEntry{"clsTollBigWSCM", Label, "Toll", "BigW", nullptr},
@@ -78,11 +85,11 @@ constexpr std::array kCatalogue = {
                    "manifest XML, consolidated manifest, dangerous goods",
                    MakeDFEDAManifestxml},
     CatalogueEntry{"clsIpecDA1250Manifest", Rows, "Ipec", "1250 manifest, consolidated manifest",
-                   nullptr},
+                   MakeIpecDA1250Manifest},
     CatalogueEntry{"clsStarTrackEODcln", Rows, "StarTrack",
                    "end-of-day CLN, consolidated manifest, dangerous goods", MakeStarTrackEODcln},
     CatalogueEntry{"clsIpecDA1250EOD", Rows, "Ipec", "1250 end of day, consolidated manifest",
-                   nullptr},
+                   MakeIpecDA1250EOD},
     CatalogueEntry{"clsTollNZSCM", Label, "Toll", "NZ", nullptr},
     CatalogueEntry{"clsAustPostDespatchSCM", Label, "Australia Post", "despatch article-id labels",
                    nullptr},

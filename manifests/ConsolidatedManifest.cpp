@@ -231,4 +231,34 @@ bool ConsolidatedManifestRows::PrintTodaysSummary() {
   return result != kNotProduced;
 }
 
+ConsignmentFileRows::ConsignmentFileRows(std::string_view className,
+                                         std::span<const GridColumn> columns,
+                                         std::size_t rowColumns, SummarySource source,
+                                         bool manifestRun)
+    : ConsolidatedManifestRows(className, columns, rowColumns, source), manifestRun_(manifestRun) {}
+
+Ref<host::ConNotes> ConsignmentFileRows::QueryConNotes() {
+  return manifestRun_ ? ManifestConNotes() : TodaysConNotes();
+}
+
+void ConsignmentFileRows::FillRow(Grid& rows, std::size_t row, const Ref<host::ConNote>& conNote) {
+  if (manifestRun_)
+    FillManifestRow(rows, row, conNote);
+  else
+    RowWriter::FillRow(rows, row, conNote);
+}
+
+bool ConsignmentFileRows::OpenRow(Procedure& proc, const Ref<host::ConNote>& conNote,
+                                  Ref<host::PackList>& packs, Ref<host::ASN>& asn) {
+  if (!proc([&] {
+        LogLine(0, "Process",
+                "ConNote " + conNote->ConNoteNo().Text() + ". ActiveX called " + ClassName());
+      }))
+    return false;
+  return proc([&] {
+    packs = conNote->Packs();
+    asn = host::Read(host::First(packs), &host::Pack::ASN);
+  });
+}
+
 }  // namespace quendal

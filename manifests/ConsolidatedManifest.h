@@ -47,4 +47,23 @@ class ConsolidatedManifestRows : public RowWriter, public virtual ConsolidatedMa
   std::string kept_;
 };
 
+// A manifest run (the consignments awaiting a manifest, whose grid also
+// shows their shipped and scheduled dates) or an end-of-day run (today's
+// consignments) that writes each chosen consignment to a carrier file.
+class ConsignmentFileRows : public ConsolidatedManifestRows {
+ protected:
+  ConsignmentFileRows(std::string_view className, std::span<const GridColumn> columns,
+                      std::size_t rowColumns, SummarySource source, bool manifestRun);
+
+  Ref<host::ConNotes> QueryConNotes() override;
+  void FillRow(Grid& rows, std::size_t row, const Ref<host::ConNote>& conNote) override;
+  // The first steps of a row: logs the call, and takes the consignment's own
+  // packs and the notice of the first, which stand in for what the despatch
+  // step hands a despatch class.
+  bool OpenRow(Procedure& proc, const Ref<host::ConNote>& conNote, Ref<host::PackList>& packs,
+               Ref<host::ASN>& asn);
+
+  const bool manifestRun_;
+};
+
 }  // namespace quendal

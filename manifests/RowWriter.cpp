@@ -148,11 +148,7 @@ std::int32_t RowWriter::Process(std::int32_t a_lRowNum, LogList& vtErrorLog) {
         return true;
       }))
     return result;
-  rowLog_ = &vtErrorLog;
-  struct Done {
-    LogList*& log;
-    ~Done() { log = nullptr; }
-  } done{rowLog_};
+  const RowLog rowLog(*this, vtErrorLog);
   result = ProcessRow(proc, conNote, vtErrorLog);
   return result;
 }

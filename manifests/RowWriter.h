@@ -93,6 +93,20 @@ class RowWriter : public virtual RowInterface, public Lifecycle {
 
   std::size_t RowCount() const { return conNotes_.size(); }
 
+  // Names the log list that LogLine also fills while it lives: the frame's
+  // Process sets it around ProcessRow; a class that does the work of its rows
+  // in its own Process sets it there.
+  class RowLog {
+   public:
+    RowLog(RowWriter& writer, LogList& list) : writer_(writer) { writer_.rowLog_ = &list; }
+    ~RowLog() { writer_.rowLog_ = nullptr; }
+    RowLog(const RowLog&) = delete;
+    RowLog& operator=(const RowLog&) = delete;
+
+   private:
+    RowWriter& writer_;
+  };
+
   // Writes one host log entry; while a row is processed its id also goes
   // into the row's log list at once, so the caller sees every entry even
   // when the row ends early.

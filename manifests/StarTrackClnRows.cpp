@@ -6,9 +6,9 @@
 namespace quendal {
 
 StarTrackClnRows::StarTrackClnRows(const StarTrackRowsVariant& variant)
-    : ConsolidatedManifestRows(variant.className, variant.columns, variant.rowColumns,
-                               variant.manifestRun ? SummarySource::OwnManifest
-                                                   : SummarySource::DateRange),
+    : ConsignmentFileRows(variant.className, variant.columns, variant.rowColumns,
+                          variant.manifestRun ? SummarySource::OwnManifest : SummarySource::DateRange,
+                          variant.manifestRun),
       variant_(variant),
       cln_(variant.cln, *this) {}
 
@@ -17,17 +17,6 @@ bool StarTrackClnRows::DGDeclaration() { return false; }
 bool StarTrackClnRows::DangerouseGoodsDeclaration(const Ref<host::ConNote>& aConnote) {
   return PrintDangerousGoodsDeclaration(DeclarationForm::StarTrack, system_, aConnote,
                                         ModuleName());
-}
-
-Ref<host::ConNotes> StarTrackClnRows::QueryConNotes() {
-  return variant_.manifestRun ? ManifestConNotes() : TodaysConNotes();
-}
-
-void StarTrackClnRows::FillRow(Grid& rows, std::size_t row, const Ref<host::ConNote>& conNote) {
-  if (variant_.manifestRun)
-    FillManifestRow(rows, row, conNote);
-  else
-    RowWriter::FillRow(rows, row, conNote);
 }
 
 std::int32_t StarTrackClnRows::ProcessRow(Procedure& proc, const Ref<host::ConNote>& conNote,
@@ -39,19 +28,8 @@ std::int32_t StarTrackClnRows::ProcessRow(Procedure& proc, const Ref<host::ConNo
   } done{cln_};
 
   ClnConsignment consignment;
-  if (!proc([&] {
-        consignment.conNote = conNote;
-        LogLine(0, "Process",
-                "ConNote " + conNote->ConNoteNo().Text() + ". ActiveX called " + ClassName());
-      }))
-    return result;
-  // The consignment's own packs and the notice of the first stand in for
-  // what the despatch step hands the despatch class.
-  if (!proc([&] {
-        consignment.packs = conNote->Packs();
-        consignment.asn = host::Read(host::First(consignment.packs), &host::Pack::ASN);
-      }))
-    return result;
+  consignment.conNote = conNote;
+  if (!OpenRow(proc, conNote, consignment.packs, consignment.asn)) return result;
   if (variant_.manifestRun) {
     if (!ManifestSaved(proc, "Failed to create manifest ID")) return result;
     if (!proc([&] { consignment.manifestNumber = manifest_->ManifestNumber(); })) return result;

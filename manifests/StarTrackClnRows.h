@@ -26,7 +26,7 @@ struct StarTrackRowsVariant {
   ClnVariant cln;
 };
 
-class StarTrackClnRows : public ConsolidatedManifestRows, private ClnWriter::Owner {
+class StarTrackClnRows : public ConsignmentFileRows, private ClnWriter::Owner {
  public:
   // Prints nothing.
   bool DGDeclaration();
@@ -37,8 +37,6 @@ class StarTrackClnRows : public ConsolidatedManifestRows, private ClnWriter::Own
  protected:
   explicit StarTrackClnRows(const StarTrackRowsVariant& variant);
 
-  Ref<host::ConNotes> QueryConNotes() override;
-  void FillRow(Grid& rows, std::size_t row, const Ref<host::ConNote>& conNote) override;
   std::int32_t ProcessRow(Procedure& proc, const Ref<host::ConNote>& conNote,
                           LogList& vtErrorLog) override;
   bool TermWork(Procedure& proc) override;

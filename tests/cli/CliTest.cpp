@@ -11,6 +11,7 @@
 #include <cstdlib>
 #include <set>
 #include <filesystem>
+#include <fstream>
 #include <nlohmann/json.hpp>
 
 #include "frame/Catalogue.h"
@@ -407,6 +408,27 @@ TEST_F(CliTest, ALongManifestRunShowsItsProgressOnATerminalOnly) {
   ASSERT_EQ(plain.status, 0);
   EXPECT_NE(plain.out.find("Process row 249:"), std::string::npos);
   EXPECT_EQ(plain.err, "");
+}
+
+TEST_F(CliTest, LayoutShowsTheShippedLayoutAndChecksASiteOne) {
+  const Result shown = Run({"layout", "show", "Quendal.clsIpecDA1250"});
+  EXPECT_EQ(shown.status, 0);
+  EXPECT_NE(shown.out.find("record trailer\n  \"%%EOF\""), std::string::npos) << shown.out;
+  ExpectOneLineError(Run({"layout", "show", "clsStarTrackDAcln"}), 1, "no layout for clsStarTrackDAcln");
+
+  std::ofstream(folder / "clsIpecDA1250.layout") << "record consignment\n  \"40\"\n  cut 4 ConNote.ConNoteNo\n";
+  const Result checked = Run({"--json", "layout", "check", "clsIpecDA1250.layout"});
+  ASSERT_EQ(checked.status, 0) << checked.err;
+  const json result = checked.Json();
+  ASSERT_EQ(result["written"].size(), 1u);
+  EXPECT_EQ(result["written"][0]["file"], "T1250_IPE0_20240314093000.DAT");
+  EXPECT_EQ(result["written"][0]["text"], "40IPE0\r\n");
+
+  std::ofstream(folder / "site.layout") << "record pack\n  cut 4 Pack.Colour\n";
+  ExpectOneLineError(Run({"layout", "check", "site.layout", "--class", "clsHunterDA"}), 1,
+                     "site.layout line 2 column 9: unknown value \"Pack.Colour\"");
+  ExpectOneLineError(Run({"layout", "check", "site.layout"}), 1, "no layout for site");
+  ExpectOneLineError(Run({"layout", "check", "none.layout", "--class", "clsHunterDA"}), 2, "cannot open none.layout");
 }
 
 }  // namespace

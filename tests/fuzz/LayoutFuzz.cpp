@@ -1,0 +1,83 @@
+// libFuzzer target: any layout file must read without crashing, looping or
+// reading out of bounds; a refused one is placed at a line and column of
+// the text and said in a short printable message; an accepted one renders
+// every record, whatever its values hold, as one line without line breaks,
+// and a delimited record reads back as one value per field.
+#include <algorithm>
+#include <cstddef>
+#include <cstdint>
+#include <cstdlib>
+#include <string>
+#include <string_view>
+#include <vector>
+
+#include "carrierfiles/Layout.h"
+
+namespace {
+
+void Check(bool condition) {
+  if (!condition) std::abort();
+}
+
+// The number of values of a delimited line, where double quotes group and
+// a doubled quote inside them stands for one; a tab always separates.
+std::size_t Columns(std::string_view line, char delimiter) {
+  std::size_t columns = 1;
+  if (delimiter == '\t') return columns + static_cast<std::size_t>(std::count(line.begin(), line.end(), '\t'));
+  bool quoted = false;
+  bool start = true;
+  for (std::size_t i = 0; i < line.size(); ++i) {
+    const char c = line[i];
+    if (quoted && c == '"' && i + 1 < line.size() && line[i + 1] == '"') {
+      ++i;
+    } else if (c == '"' && (quoted || start)) {
+      quoted = !quoted;
+    } else if (c == delimiter && !quoted) {
+      ++columns;
+      start = true;
+      continue;
+    }
+    start = false;
+  }
+  Check(!quoted);
+  return columns;
+}
+
+}  // namespace
+
+extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
+  if (size == 0) return 0;
+  // The first byte gives the length of a value taken from the end of the
+  // input (0: a value with delimiters, quotes and a line break), handed to
+  // every computed text value; the bytes between are the layout file.
+  const std::string_view input(reinterpret_cast<const char*>(data) + 1, size - 1);
+  const std::size_t length = std::min<std::size_t>(data[0] % 17, input.size());
+  const std::string_view bytes = input.substr(0, input.size() - length);
+  const std::string value =
+      length == 0 ? std::string("a,\"b\"\t;|\r\n") : std::string(input.substr(input.size() - length));
+
+  const quendal::LayoutRead read = quendal::ReadLayout(bytes);
+  if (!read.layout) {
+    const std::size_t lines = static_cast<std::size_t>(std::count(bytes.begin(), bytes.end(), '\n') +
+                                                       std::count(bytes.begin(), bytes.end(), '\r'));
+    Check(read.problem.line >= 1 && static_cast<std::size_t>(read.problem.line) <= lines + 1);
+    Check(read.problem.column >= 1 && static_cast<std::size_t>(read.problem.column) <= bytes.size() + 3);
+    Check(!read.problem.message.empty() && read.problem.message.size() < 300);
+    for (const char c : read.problem.message) Check(c >= 0x20 && c < 0x7F);
+    return 0;
+  }
+  const quendal::Layout& layout = *read.layout;
+  Check(!layout.records.empty());
+  quendal::LayoutValues values;
+  values.serviceCode = value;
+  values.fileName = value;
+  values.manifestNumber = quendal::Var(value);
+  values.packCount = 3;
+  values.totalWeight = 12.5;
+  for (const quendal::LayoutRecord& record : layout.records) {
+    const std::string line = quendal::RenderRecord(layout, record, values, nullptr, 2);
+    Check(line.find_first_of("\r\n") == std::string::npos);
+    if (layout.delimited) Check(Columns(line, layout.delimiter) == record.fields.size());
+  }
+  return 0;
+}

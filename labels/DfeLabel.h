@@ -7,25 +7,21 @@
 
 #include <array>
 
-#include "labels/GenericFields.h"
+#include "labels/GenericLabel.h"
 
 namespace quendal {
 
 inline constexpr std::string_view kDfeNumber = "480";
 
-// Everything but the ship-to barcode.
-inline constexpr std::array<vpcl::Packet, 35> kDfeBody = {
+// The destination, service and consignment at the top.
+inline constexpr std::array<vpcl::Packet, 3> kDfeTop = {
     vpcl::Field{28, 34, 762, 5, 3, 1, 2, 'B', 'L'},
     vpcl::Field{29, 20, 738, 5, 3, 1, 1, 'B', 'L'},
     vpcl::Field{34, 30, 738, 190, 3, 1, 1, 'B', 'L'},
-    vpcl::Line{725, 2, 725, 398, 6},
-    vpcl::Text{710, 5, 1, 1, 1, 'O', 'L', 0, "FROM:"},
-    vpcl::Field{1, 25, 710, 48, 1, 1, 1, 'O', 'L'},
-    vpcl::Field{10, 25, 698, 5, 1, 1, 1, 'O', 'L'},
-    vpcl::Field{2, 25, 686, 5, 1, 1, 1, 'O', 'L'},
-    vpcl::Field{3, 3, 686, 150, 1, 1, 1, 'O', 'L'},
-    vpcl::Text{710, 230, 1, 1, 1, 'O', 'L', 0, "CARRIER:"},
-    vpcl::Field{4, 20, 698, 230, 1, 1, 1, 'B', 'L'},
+};
+// Under the sender and carrier: the receiver, the consignment large, order
+// references, dates and free lines, the postcode and state large.
+inline constexpr std::array<vpcl::Packet, 24> kDfeMiddle = {
     vpcl::Field{30, 40, 686, 230, 1, 1, 1, 'B', 'L'},
     vpcl::Line{675, 2, 675, 398, 2},
     vpcl::Text{660, 5, 1, 2, 1, 'O', 'L', 0, "TO:"},
@@ -51,6 +47,8 @@ inline constexpr std::array<vpcl::Packet, 35> kDfeBody = {
     vpcl::Field{13, 3, 290, 230, 3, 3, 4, 'B', 'L'},
     vpcl::Line{235, 2, 235, 398, 2},
 };
+// Everything but the ship-to barcode.
+inline constexpr auto kDfeBody = vpcl::Join(kDfeTop, generic::SenderBlock(710), kDfeMiddle);
 
 // The ship-to (421) barcode and its line.
 inline constexpr std::array<vpcl::Packet, 2> kDfeShipTo = {

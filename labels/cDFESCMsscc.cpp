@@ -2,7 +2,7 @@
 
 #include <array>
 
-#include "labels/GenericFields.h"
+#include "labels/GenericLabel.h"
 
 namespace quendal {
 
@@ -16,18 +16,12 @@ constexpr std::string_view kAustralia = "036";
 // 600 x 400: destination and consignment large at the top, sender and
 // carrier, the receiver, order references and dates, the SSCC's line, the
 // ship-to barcode and the SSCC barcode at the bottom.
-constexpr std::array<Packet, 36> kPackets = {
+constexpr std::array<Packet, 3> kTop = {
     Field{28, 34, 577, 5, 3, 1, 1, 'B', 'L'},
     Field{34, 20, 557, 5, 3, 1, 1, 'B', 'L'},
     Field{29, 20, 557, 250, 1, 2, 1, 'B', 'L'},
-    Line{545, 2, 545, 398, 6},
-    Text{532, 5, 1, 1, 1, 'O', 'L', 0, "FROM:"},
-    Field{1, 25, 532, 48, 1, 1, 1, 'O', 'L'},
-    Field{10, 25, 520, 5, 1, 1, 1, 'O', 'L'},
-    Field{2, 25, 508, 5, 1, 1, 1, 'O', 'L'},
-    Field{3, 3, 508, 150, 1, 1, 1, 'O', 'L'},
-    Text{532, 230, 1, 1, 1, 'O', 'L', 0, "CARRIER:"},
-    Field{4, 20, 520, 230, 1, 1, 1, 'B', 'L'},
+};
+constexpr std::array<Packet, 25> kBelow = {
     Field{30, 40, 508, 230, 1, 1, 1, 'B', 'L'},
     Field{5, 13, 485, 230, 1, 2, 1, 'B', 'L'},
     Line{476, 2, 476, 398, 2},
@@ -54,6 +48,7 @@ constexpr std::array<Packet, 36> kPackets = {
     Text{185, 250, 1, 1, 1, 'O', 'L', 0, "SHIP TO"},
     Line{175, 2, 175, 398, 2},
 };
+constexpr auto kPackets = Join(kTop, generic::SenderBlock(532), kBelow);
 
 using V = const LabelValues&;
 constexpr std::array<BatchField, 2> kShipToFields = {{

@@ -2,7 +2,7 @@
 
 #include <array>
 
-#include "labels/GenericFields.h"
+#include "labels/GenericLabel.h"
 
 namespace quendal {
 

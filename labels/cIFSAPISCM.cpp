@@ -2,7 +2,7 @@
 
 #include <array>
 
-#include "labels/GenericFields.h"
+#include "labels/GenericLabel.h"
 
 namespace quendal {
 
@@ -13,18 +13,12 @@ using namespace vpcl;
 // 600 x 400: destination, service and consignment at the top, sender and
 // carrier, the receiver, order references and dates, then the SSCC large
 // with its barcode filling the bottom.
-constexpr std::array<Packet, 33> kPackets = {
+constexpr std::array<Packet, 3> kTop = {
     Field{28, 34, 577, 5, 3, 1, 1, 'B', 'L'},
     Field{29, 20, 557, 5, 1, 2, 1, 'B', 'L'},
     Field{34, 20, 557, 200, 1, 2, 1, 'B', 'L'},
-    Line{545, 2, 545, 398, 6},
-    Text{532, 5, 1, 1, 1, 'O', 'L', 0, "FROM:"},
-    Field{1, 25, 532, 48, 1, 1, 1, 'O', 'L'},
-    Field{10, 25, 520, 5, 1, 1, 1, 'O', 'L'},
-    Field{2, 25, 508, 5, 1, 1, 1, 'O', 'L'},
-    Field{3, 3, 508, 150, 1, 1, 1, 'O', 'L'},
-    Text{532, 230, 1, 1, 1, 'O', 'L', 0, "CARRIER:"},
-    Field{4, 20, 520, 230, 1, 1, 1, 'B', 'L'},
+};
+constexpr std::array<Packet, 22> kBelow = {
     Text{508, 230, 1, 1, 1, 'O', 'L', 0, "CONNOTE:"},
     Field{5, 13, 508, 285, 1, 1, 1, 'B', 'L'},
     Line{498, 2, 498, 398, 2},
@@ -48,6 +42,7 @@ constexpr std::array<Packet, 33> kPackets = {
     Barcode{24, 21, 'V', 45, 40, 4, 250},
     Field{25, 30, 25, 60, 1, 1, 1, 'B', 'L'},
 };
+constexpr auto kPackets = Join(kTop, generic::SenderBlock(532), kBelow);
 
 constexpr auto kBatch =
     Join(generic::kAddressFields, generic::kSsccFields, generic::kOrderFields, generic::kTailFields);

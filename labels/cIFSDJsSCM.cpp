@@ -4,7 +4,7 @@
 
 #include "frame/VB.h"
 #include "frame/host/Read.h"
-#include "labels/GenericFields.h"
+#include "labels/GenericLabel.h"
 
 namespace quendal {
 
@@ -15,20 +15,14 @@ using namespace vpcl;
 // 600 x 400: the store's number large in a box at the top right beside the
 // destination, then sender and carrier, the receiver, order references and
 // dates, the store zone, and the SSCC barcode at the bottom.
-constexpr std::array<Packet, 36> kPackets = {
+constexpr std::array<Packet, 5> kTop = {
     Text{585, 5, 1, 1, 1, 'O', 'L', 0, "DAVID JONES STORE"},
     Field{28, 34, 560, 5, 3, 1, 1, 'B', 'L'},
     Field{34, 20, 540, 5, 1, 2, 1, 'B', 'L'},
     Box{535, 270, 595, 395, 4, "11111111"},
     Field{9, 4, 545, 280, 3, 2, 2, 'B', 'L'},
-    Line{528, 2, 528, 398, 6},
-    Text{515, 5, 1, 1, 1, 'O', 'L', 0, "FROM:"},
-    Field{1, 25, 515, 48, 1, 1, 1, 'O', 'L'},
-    Field{10, 25, 503, 5, 1, 1, 1, 'O', 'L'},
-    Field{2, 25, 491, 5, 1, 1, 1, 'O', 'L'},
-    Field{3, 3, 491, 150, 1, 1, 1, 'O', 'L'},
-    Text{515, 230, 1, 1, 1, 'O', 'L', 0, "CARRIER:"},
-    Field{4, 20, 503, 230, 1, 1, 1, 'B', 'L'},
+};
+constexpr std::array<Packet, 23> kBelow = {
     Text{491, 230, 1, 1, 1, 'O', 'L', 0, "CONNOTE:"},
     Field{5, 13, 491, 285, 1, 1, 1, 'B', 'L'},
     Line{481, 2, 481, 398, 2},
@@ -53,6 +47,7 @@ constexpr std::array<Packet, 36> kPackets = {
     Barcode{24, 21, 'V', 45, 40, 4, 200},
     Field{25, 30, 25, 60, 1, 1, 1, 'B', 'L'},
 };
+constexpr auto kPackets = Join(kTop, generic::SenderBlock(515), kBelow);
 
 constexpr std::array<BatchField, 2> kStoreFields = {{
     {9, &LabelValues::StoreText},

@@ -1,6 +1,7 @@
-// Batch fields of the formats that print the reference values, numbered as
-// the "Generic" format numbers them, in the groups that several formats
-// share. A format joins the groups it lays out and adds its own fields.
+// What the formats that print the reference values share: the sender and
+// carrier block, and the batch fields, numbered as the "Generic" format
+// numbers them, in groups. A format joins the pieces it lays out and adds
+// its own.
 #pragma once
 
 #include <array>
@@ -9,6 +10,22 @@
 #include "labels/LabelPrinter.h"
 
 namespace quendal::generic {
+
+// Under a heavy line, the sender on the left (FROM: and fields 1, 10, 2, 3)
+// and the carrier on the right (CARRIER: and field 4); `row` is the row of
+// the captions, the lines below follow 12 rows apart.
+constexpr std::array<vpcl::Packet, 8> SenderBlock(int row) {
+  return {{
+      vpcl::Line{row + 13, 2, row + 13, 398, 6},
+      vpcl::Text{row, 5, 1, 1, 1, 'O', 'L', 0, "FROM:"},
+      vpcl::Field{1, 25, row, 48, 1, 1, 1, 'O', 'L'},
+      vpcl::Field{10, 25, row - 12, 5, 1, 1, 1, 'O', 'L'},
+      vpcl::Field{2, 25, row - 24, 5, 1, 1, 1, 'O', 'L'},
+      vpcl::Field{3, 3, row - 24, 150, 1, 1, 1, 'O', 'L'},
+      vpcl::Text{row, 230, 1, 1, 1, 'O', 'L', 0, "CARRIER:"},
+      vpcl::Field{4, 20, row - 12, 230, 1, 1, 1, 'B', 'L'},
+  }};
+}
 
 using V = const LabelValues&;
 

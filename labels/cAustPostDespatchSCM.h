@@ -1,6 +1,7 @@
-// Australia Post article label for despatched parcels: the eParcel "APEP" and
-// express "APEX" formats (952) with the carrier's graphic, the article
-// identifier the eParcel manifest lists for the carton, and the SSCC (00).
+// Australia Post article label of the despatch office, the same label as
+// clsAustPostSCM: the eParcel "APEP" and express "APEX" formats (952) with
+// the carrier's graphic, the article identifier the eParcel manifest lists
+// for the carton, and the SSCC (00).
 #pragma once
 
 #include <memory>

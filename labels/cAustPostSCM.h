@@ -1,6 +1,6 @@
-// Australia Post article label for any sender's parcels: the eParcel "APEP" and
-// express "APEX" formats (952) with the carrier's graphic, the article
-// identifier the eParcel manifest lists for the carton, and the SSCC (00).
+// Australia Post article label: the eParcel "APEP" and express "APEX"
+// formats (952) with the carrier's graphic, the article identifier the
+// eParcel manifest lists for the carton, and the SSCC (00).
 #pragma once
 
 #include <memory>

@@ -28,7 +28,10 @@ std::string clsAaEGenericSCM::VPCLIIBatchCommand() {
   Procedure proc = Guard("Function VPCLIIBatchCommand");
   std::string format;
   if (!proc([&] { format = PrintVPCLII(); }) || format.empty()) return result;
-  proc([&] { result = format + BatchOf(system_->PrinterBatchMode().Text()); });
+  proc([&] {
+    format += BatchOf(system_->PrinterBatchMode().Text());
+    result = std::move(format);
+  });
   return result;
 }
 

@@ -25,8 +25,8 @@ const std::string kConsignment =
     "C,345,15,0,1,1,1,O,L,0,0,\"Date Packed 14/03/24\"|";
 const std::string kSender =
     "C,305,12,0,2,1,1,B,L,0,0,\"Acme Apparel Pty Ltd\"|C,289,12,0,1,1,1,O,L,0,0,\"12 Example Road\"|"
-    "C,277,12,0,1,1,1,O,L,0,0,\"DANDENONG SOUTH VIC\"|C,250,100,0,1,1,1,B,L,0,0,\"PO PO778812 REL# 2\"|"
-    "C,236,100,0,1,1,1,B,L,0,0,\"SO SO10045\"|C,212,12,0,1,1,1,O,L,0,0,\"\"|"
+    "C,277,12,0,1,1,1,O,L,0,0,\"DANDENONG SOUTH VIC\"|C,250,115,0,1,1,1,B,L,0,0,\"PO PO778812 REL# 2\"|"
+    "C,236,115,0,1,1,1,B,L,0,0,\"SO SO10045\"|C,212,12,0,1,1,1,O,L,0,0,\"\"|"
     "C,198,12,0,1,1,1,O,L,0,0,\"\"|";
 const std::string kBottom =
     "C,95,12,0,3,2,2,B,L,0,0,\"3148\"|C,55,12,0,3,1,1,B,L,0,0,\"VIC\"|"

@@ -1,12 +1,17 @@
 #include "labels/Graphics.h"
 
 #include <cstdlib>
+#include <filesystem>
+
+#include "frame/FailSafe.h"
 
 #include "platform/FileSystem.h"
 
 namespace quendal {
 
 namespace {
+
+namespace fs = std::filesystem;
 
 // A label graphic is a few kilobytes; anything this large is not one.
 constexpr std::size_t kLargestGraphic = 1 << 20;
@@ -24,6 +29,13 @@ std::string GraphicPath(std::string_view fileName) {
     return InFolder(folder, fileName);
   const std::string installed = InFolder(QUENDAL_INSTALLED_GRAPHICS, fileName);
   if (FileExists(installed)) return installed;
+  // Installed under another prefix: beside the library's (or the program's) folder.
+  const fs::path binary(LibraryPath());
+  if (binary.has_parent_path()) {
+    const std::string moved =
+        (binary.parent_path().parent_path() / "share/quendal/graphics" / fileName).string();
+    if (FileExists(moved)) return moved;
+  }
   return InFolder(QUENDAL_SOURCE_GRAPHICS, fileName);
 }
 

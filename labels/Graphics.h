@@ -12,8 +12,9 @@ namespace quendal {
 
 // Where the graphic file of this name is read from: the folder named by
 // QUENDAL_GRAPHICS_DIR when it is set, else the folder the library installs
-// its graphics in, else (a library used where it was built) the graphics of
-// its sources.
+// its graphics in, else share/quendal/graphics beside the folder of the
+// library (or the program it is linked into), else (a library used where it
+// was built) the graphics of its sources.
 std::string GraphicPath(std::string_view fileName);
 
 // The rows of a graphic file; nothing when the file cannot be read, is

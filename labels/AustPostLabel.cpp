@@ -1,9 +1,9 @@
 #include "labels/AustPostLabel.h"
 
-#include "frame/VB.h"
 #include "frame/Error.h"
-#include "labels/Gs1.h"
+#include "frame/VB.h"
 #include "labels/Graphics.h"
+#include "labels/Gs1.h"
 #include "labels/WinPrint.h"
 #include "manifests/PcmsDocument.h"
 

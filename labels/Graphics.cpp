@@ -4,7 +4,6 @@
 #include <filesystem>
 
 #include "frame/FailSafe.h"
-
 #include "platform/FileSystem.h"
 
 namespace quendal {

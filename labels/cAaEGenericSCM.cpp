@@ -49,8 +49,7 @@ bool clsAaEGenericSCM::FillValues(Procedure& proc) {
   std::int32_t count = 0;
   return
       // One label a carton, pallets too: the batch that follows the format prints one.
-      proc([&] { copies_ = 1; }) &&
-      proc([&] {
+      proc([&] { copies_ = 1; }) && proc([&] {
         if (!pack_->ASNId().IsNull()) conNote = pack_->ConNote();
       }) &&
       proc([&] {

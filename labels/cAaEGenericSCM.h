@@ -28,8 +28,8 @@ class clsAaEGenericSCM : public LabelPrinter {
   std::string serviceCode_;
   std::string article_;  // the barcode's data
   std::string weight_;
-  std::string place_;    // suburb, state and postcode on one line
-  std::string sender_;   // sender's locality and state
+  std::string place_;   // suburb, state and postcode on one line
+  std::string sender_;  // sender's locality and state
   std::vector<vpcl::Packet> packets_;
 };
 

@@ -4,6 +4,8 @@ namespace quendal {
 
 clsAustPostDespatchSCM::clsAustPostDespatchSCM() : AustPostLabelPrinter("clsAustPostDespatchSCM") {}
 
-std::unique_ptr<Component> MakeAustPostDespatchSCM() { return std::make_unique<clsAustPostDespatchSCM>(); }
+std::unique_ptr<Component> MakeAustPostDespatchSCM() {
+  return std::make_unique<clsAustPostDespatchSCM>();
+}
 
 }  // namespace quendal

@@ -52,8 +52,8 @@ constexpr std::array<Packet, 35> kPackets = {
     Field{29, 20, 105, 5, 3, 1, 1, 'B', 'L'},
 };
 
-constexpr auto kBatch = Join(generic::kAddressFields, generic::kPostcodeFields, generic::kOrderFields,
-                           generic::kTailFields);
+constexpr auto kBatch = Join(generic::kAddressFields, generic::kPostcodeFields,
+                             generic::kOrderFields, generic::kTailFields);
 
 constexpr LabelLayout kLayout{"530", vpcl::Format{"1HUNTER", 600, 400, kPackets}, kBatch};
 
@@ -61,6 +61,8 @@ constexpr LabelLayout kLayout{"530", vpcl::Format{"1HUNTER", 600, 400, kPackets}
 
 clsHunterGenericSCM::clsHunterGenericSCM() : LabelPrinter("clsHunterGenericSCM", kLayout) {}
 
-std::unique_ptr<Component> MakeHunterGenericSCM() { return std::make_unique<clsHunterGenericSCM>(); }
+std::unique_ptr<Component> MakeHunterGenericSCM() {
+  return std::make_unique<clsHunterGenericSCM>();
+}
 
 }  // namespace quendal

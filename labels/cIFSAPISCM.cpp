@@ -44,8 +44,8 @@ constexpr std::array<Packet, 22> kBelow = {
 };
 constexpr auto kPackets = Join(kTop, generic::SenderBlock(532), kBelow);
 
-constexpr auto kBatch =
-    Join(generic::kAddressFields, generic::kSsccFields, generic::kOrderFields, generic::kTailFields);
+constexpr auto kBatch = Join(generic::kAddressFields, generic::kSsccFields, generic::kOrderFields,
+                             generic::kTailFields);
 
 constexpr LabelLayout kLayout{"750", vpcl::Format{"IFSAPI", 600, 400, kPackets}, kBatch};
 

@@ -67,7 +67,8 @@ std::unique_ptr<Component> MakeIFSDJsSCM() { return std::make_unique<clsIFSDJsSC
 
 bool clsIFSDJsSCM::FillValues(Procedure& proc) {
   return LabelPrinter::FillValues(proc) && proc([&] {
-           values_.StoreText = quendal::Format(host::Read(pack_->ShipTo(), &host::Receiver::StoreCode), "0000");
+           values_.StoreText =
+               quendal::Format(host::Read(pack_->ShipTo(), &host::Receiver::StoreCode), "0000");
          });
 }
 

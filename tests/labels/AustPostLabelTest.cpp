@@ -33,9 +33,11 @@ const std::string kExpressHeader = "{F,952,A,R,E,600,400,\"APEX\"|G,99,545,243,0
 // The second of three cartons sent to J Smith.
 const std::string kSecondCarton =
     "{B,952,N,1|E,1,0,1,1,0,1|1,\"J SMITH\"|2,\"5 SAMPLE STREET\"|3,\"\"|4,\"RICHMOND VIC 3121\"|"
-    "5,\"Leave at the side door\"|6,\"SIGNATURE ON DELIVERY REQUIRED\"|7,\"NPP11234567\"|8,\"2 of 3\"|"
+    "5,\"Leave at the side door\"|6,\"SIGNATURE ON DELIVERY REQUIRED\"|7,\"NPP11234567\"|8,\"2 of "
+    "3\"|"
     "9,\"3 PC\"|10,\"NPP11234567025024\"|11,\"NPP11234567025024\"|12,\"NPP11234567025024\"|"
-    "13,\"SSCC: (00)093123450000000029\"|14,\"~20100093123450000000029\"|15,\"Acme Apparel Pty Ltd\"|"
+    "13,\"SSCC: (00)093123450000000029\"|14,\"~20100093123450000000029\"|15,\"Acme Apparel Pty "
+    "Ltd\"|"
     "16,\"12 Example Road\"|17,\"DANDENONG SOUTH VIC\"|18,\"PO PO778812 REL# 2\"|19,\"SO SO10045\"|"
     "20,\"Date Packed 14/03/24\"|}";
 
@@ -46,15 +48,19 @@ class AustPostTest : public test::LabelFixture {
     const char* graphics = std::getenv("QUENDAL_GRAPHICS_DIR");
     savedGraphics = graphics ? std::optional<std::string>(graphics) : std::nullopt;
     ::setenv("QUENDAL_GRAPHICS_DIR", graphicsDir.path().c_str(), 1);
-    test::WriteText(graphicsDir / std::string(kAustPostGraphicFile), "1,1,H,2,\"F0F0\"|3,1,H,2,\"0F0F\"|");
+    test::WriteText(graphicsDir / std::string(kAustPostGraphicFile),
+                    "1,1,H,2,\"F0F0\"|3,1,H,2,\"0F0F\"|");
 
     // The postal carrier's account and the consignment of three cartons to J Smith.
     vendor->fields["VendorId"] = 1;
-    carrier->fields = {{"CarrierId", 2},       {"Name", "Australia Post"}, {"Options", "EP"},
-                       {"AccountRef", "NPP1"}, {"AccountNumber", "98765"}, {"FileFolder", manifestDir.path() + "/"}};
-    order->fields["DeliveryAddress"] = host.Make<host::Address>(
-        {{"Name", "J \"Smith\""}, {"Line1", "5 Sample Street"}, {"Suburb", "Richmond"}, {"State", "Vic"},
-         {"Postcode", "3121"}});
+    carrier->fields = {{"CarrierId", 2},           {"Name", "Australia Post"},
+                       {"Options", "EP"},          {"AccountRef", "NPP1"},
+                       {"AccountNumber", "98765"}, {"FileFolder", manifestDir.path() + "/"}};
+    order->fields["DeliveryAddress"] = host.Make<host::Address>({{"Name", "J \"Smith\""},
+                                                                 {"Line1", "5 Sample Street"},
+                                                                 {"Suburb", "Richmond"},
+                                                                 {"State", "Vic"},
+                                                                 {"Postcode", "3121"}});
     conNote->fields["ConNoteId"] = 102;
     conNote->fields["ConNoteDate"] = DateTime::FromParts(2024, 3, 14, 9, 0);
     conNote->fields["ServiceLevel"] = "STANDARD";
@@ -80,8 +86,11 @@ class AustPostTest : public test::LabelFixture {
   // The article ids the eParcel manifest lists for the consignment.
   Strings ManifestArticles() {
     host.Make<host::Partner>({{"PartnerId", 1}});
-    host.Make<host::EDIDocument>(
-        {{"ID", 7}, {"VendorId", 1}, {"PartnerId", 1}, {"CarrierId", 2}, {"OutputFolder", manifestDir.path() + "/"}});
+    host.Make<host::EDIDocument>({{"ID", 7},
+                                  {"VendorId", 1},
+                                  {"PartnerId", 1},
+                                  {"CarrierId", 2},
+                                  {"OutputFolder", manifestDir.path() + "/"}});
     auto object = CreateObject("Quendal.clseParcelManifestxml").object;
     auto* rows = as<RowInterface>(object);
     Grid columns, grid;
@@ -94,7 +103,8 @@ class AustPostTest : public test::LabelFixture {
     for (const auto& entry : std::filesystem::directory_iterator(manifestDir.path())) {
       pugi::xml_document doc;
       EXPECT_TRUE(doc.load_string(test::ReadText(entry.path().string()).c_str()));
-      for (const auto& node : doc.select_nodes("//ArticleNumber")) ids.push_back(node.node().child_value());
+      for (const auto& node : doc.select_nodes("//ArticleNumber"))
+        ids.push_back(node.node().child_value());
     }
     return ids;
   }
@@ -123,8 +133,8 @@ TEST_F(AustPostTest, WithoutItsGraphicFileTheFormatStillGoesAndTheOperatorIsTold
   const auto jobs = TakeJobs();
   ASSERT_EQ(jobs.size(), 1u);
   EXPECT_TRUE(jobs[0].starts_with(kParcelHeader));
-  EXPECT_EQ(host.LogMessages(),
-            Strings{"Graphic 99 not sent: cannot read " + graphicsDir / std::string(kAustPostGraphicFile)});
+  EXPECT_EQ(host.LogMessages(), Strings{"Graphic 99 not sent: cannot read " +
+                                        graphicsDir / std::string(kAustPostGraphicFile)});
   // The graphic installed with the library is found where the library was built.
   ::unsetenv("QUENDAL_GRAPHICS_DIR");
   EXPECT_TRUE(ReadGraphic(GraphicPath(kAustPostGraphicFile)));
@@ -146,7 +156,8 @@ TEST_F(AustPostTest, EachCartonCarriesTheArticleTheManifestListsForIt) {
   auto stray = MakePack(1004, "00093123450000000043");
   stray->fields["ConNote"] = conNote;
   const std::string job = Printed(stray);
-  EXPECT_NE(job.find("|8,\"4 of 4\"|9,\"4 PC\"|10,\"NPP11234567045022\"|"), std::string::npos) << job;
+  EXPECT_NE(job.find("|8,\"4 of 4\"|9,\"4 PC\"|10,\"NPP11234567045022\"|"), std::string::npos)
+      << job;
 }
 
 TEST_F(AustPostTest, ExpressParcelsTakeTheExpressFormatAndEachLabelFindsItsFormatOnThePrinter) {

@@ -26,7 +26,8 @@ const std::string kAddress =
 const std::string kPostcode = "12,\"3148\"|13,\"VIC\"|";
 const std::string kOrder = "20,\"PO PO778812 REL# 2\"|21,\"SO SO10045\"|";
 const std::string kTail =
-    "26,\"\"|27,\"\"|28,\"CHADSTONE\"|29,\"3148 EXP\"|30,\"SERVICE:EXP\"|31,\"Date Packed 14/03/24\"|"
+    "26,\"\"|27,\"\"|28,\"CHADSTONE\"|29,\"3148 EXP\"|30,\"SERVICE:EXP\"|31,\"Date Packed "
+    "14/03/24\"|"
     "32,\"Not Before  15/03/24\"|33,\"Not After   20/03/24\"|34,\"C/N:SRX0001234567\"|";
 const std::string kSscc =
     "19,\"(00)093123450000000012\"|24,\"~20100093123450000000012\"|25,\"(00)093123450000000012\"|";
@@ -47,17 +48,33 @@ const std::string kSsccText = "(00)093123450000000012";
 const std::string kShipToText = "(421)0363148";
 
 const Case kCases[] = {
-    {"clsDFESCM", "{F,480,A,R,E,800,400,\"DFESCM\"|", Batch("480", kAddress + kPostcode + kOrder + kTail), {}},
-    {"clsDFESCMWinPCL", "{F,480,A,R,E,800,400,\"DFESCM\"|",
-     Batch("480", kAddress + kPostcode + kOrder + kTail + kShipTo), {kShipToText}},
-    {"clsDFESCMsscc", "{F,482,A,R,E,600,400,\"DFESSCC\"|",
-     Batch("482", kAddress + kShipTo + kSscc + kOrder + kTail), {kSsccText, kShipToText}},
-    {"clsSCMnoSSCC", "{F,480,A,R,M,2000,1016,\"DFESCM\"|", Batch("480", kAddress + kPostcode + kOrder + kTail), {}},
-    {"clsHunterGenericSCM", "{F,530,A,R,E,600,400,\"1HUNTER\"|",
-     Batch("530", kAddress + kPostcode + kOrder + kTail), {}},
-    {"clsIFSDJsSCM", "{F,20,A,R,E,600,400,\"IFSDJS\"|",
-     Batch("20", kAddress + "9,\"0412\"|35,\"LEVEL 2\"|" + kSscc + kOrder + kTail), {kSsccText}},
-    {"clsIFSAPISCM", "{F,750,A,R,E,600,400,\"IFSAPI\"|", Batch("750", kAddress + kSscc + kOrder + kTail),
+    {"clsDFESCM",
+     "{F,480,A,R,E,800,400,\"DFESCM\"|",
+     Batch("480", kAddress + kPostcode + kOrder + kTail),
+     {}},
+    {"clsDFESCMWinPCL",
+     "{F,480,A,R,E,800,400,\"DFESCM\"|",
+     Batch("480", kAddress + kPostcode + kOrder + kTail + kShipTo),
+     {kShipToText}},
+    {"clsDFESCMsscc",
+     "{F,482,A,R,E,600,400,\"DFESSCC\"|",
+     Batch("482", kAddress + kShipTo + kSscc + kOrder + kTail),
+     {kSsccText, kShipToText}},
+    {"clsSCMnoSSCC",
+     "{F,480,A,R,M,2000,1016,\"DFESCM\"|",
+     Batch("480", kAddress + kPostcode + kOrder + kTail),
+     {}},
+    {"clsHunterGenericSCM",
+     "{F,530,A,R,E,600,400,\"1HUNTER\"|",
+     Batch("530", kAddress + kPostcode + kOrder + kTail),
+     {}},
+    {"clsIFSDJsSCM",
+     "{F,20,A,R,E,600,400,\"IFSDJS\"|",
+     Batch("20", kAddress + "9,\"0412\"|35,\"LEVEL 2\"|" + kSscc + kOrder + kTail),
+     {kSsccText}},
+    {"clsIFSAPISCM",
+     "{F,750,A,R,E,600,400,\"IFSAPI\"|",
+     Batch("750", kAddress + kSscc + kOrder + kTail),
      {kSsccText}},
 };
 
@@ -104,7 +121,8 @@ TEST_P(EachPlainLabelDrawn, BarcodesReadBackAsTheirElementStrings) {
 }
 
 INSTANTIATE_TEST_SUITE_P(Classes, EachPlainLabelDrawn,
-                         ::testing::Combine(::testing::ValuesIn(kCases), ::testing::Values(203, 300)),
+                         ::testing::Combine(::testing::ValuesIn(kCases),
+                                            ::testing::Values(203, 300)),
                          [](const auto& info) {
                            return std::string(std::get<0>(info.param).className) + "_" +
                                   std::to_string(std::get<1>(info.param));
@@ -112,7 +130,8 @@ INSTANTIATE_TEST_SUITE_P(Classes, EachPlainLabelDrawn,
 
 // The DFE label, 800 x 400, whole.
 const std::string kDfeFormat =
-    "{F,480,A,R,E,800,400,\"DFESCM\"|T,28,34,V,762,5,0,3,1,2,B,L,0,0,0|T,29,20,V,738,5,0,3,1,1,B,L,0,0,0|"
+    "{F,480,A,R,E,800,400,\"DFESCM\"|T,28,34,V,762,5,0,3,1,2,B,L,0,0,0|T,29,20,V,738,5,0,3,1,1,B,L,"
+    "0,0,0|"
     "T,34,30,V,738,190,0,3,1,1,B,L,0,0,0|L,S,723,2,723,398,6,\"11111111\"|"
     "C,710,5,0,1,1,1,O,L,0,0,\"FROM:\"|T,1,25,V,710,48,0,1,1,1,O,L,0,0,0|"
     "T,10,25,V,698,5,0,1,1,1,O,L,0,0,0|T,2,25,V,686,5,0,1,1,1,O,L,0,0,0|"
@@ -129,7 +148,8 @@ const std::string kDfeFormat =
     "T,27,30,V,415,5,0,1,2,1,B,L,0,0,0|L,S,400,2,400,398,2,\"11111111\"|"
     "C,385,5,0,1,1,1,O,L,0,0,\"POSTCODE\"|T,12,4,V,290,5,0,3,4,4,B,L,0,0,0|"
     "C,385,230,0,1,1,1,O,L,0,0,\"STATE\"|T,13,3,V,290,230,0,3,3,4,B,L,0,0,0|"
-    "L,S,235,2,235,398,2,\"11111111\"|B,17,27,V,80,40,8,4,130,8,L,0|T,18,30,V,60,60,0,1,1,1,B,L,0,0,0|}";
+    "L,S,235,2,235,398,2,\"11111111\"|B,17,27,V,80,40,8,4,130,8,L,0|T,18,30,V,60,60,0,1,1,1,B,L,0,"
+    "0,0|}";
 
 TEST_F(PlainLabelTest, BothDfeClassesFillOneFormat) {
   for (const char* className : {"clsDFESCM", "clsDFESCMWinPCL"})
@@ -196,7 +216,8 @@ TEST_F(PlainLabelTest, TheDfeSsccLabelShipsToAustraliaWhateverTheCountryCode) {
 
 TEST_F(PlainLabelTest, TheDavidJonesLabelPrintsAPackListWithSeparators) {
   auto second = MakePack(1002, "00093123450000000029");
-  auto otherOrder = host.Make<host::Order>({{"OrderNo", "SO10046"}, {"DeliveryAddress", host.Make<host::Address>()}});
+  auto otherOrder = host.Make<host::Order>(
+      {{"OrderNo", "SO10046"}, {"DeliveryAddress", host.Make<host::Address>()}});
   second->fields["Order"] = otherOrder;
   test::MemoryHost::Attach(conNote, {pack, second});
   auto object = Make("clsIFSDJsSCM");
@@ -204,13 +225,17 @@ TEST_F(PlainLabelTest, TheDavidJonesLabelPrintsAPackListWithSeparators) {
   ASSERT_NE(packs, nullptr);
   ASSERT_TRUE(as<LabelInterface>(object)->Init(host.system, "Dock 3"));
   TakeJobs();
-  ASSERT_TRUE(packs->PrintAllLabels(test::MemoryHost::List<host::Pack>({pack, second}), true, false));
+  ASSERT_TRUE(
+      packs->PrintAllLabels(test::MemoryHost::List<host::Pack>({pack, second}), true, false));
   // A separator before each order's cartons, each carton's batch with its store.
   const auto jobs = TakeJobs();
   ASSERT_EQ(jobs.size(), 1u);
-  EXPECT_TRUE(jobs[0].starts_with(packs->RatioSeparator("PACK ID 1001") + "\r\n{B,20,N,1|")) << jobs[0];
-  EXPECT_NE(jobs[0].find("|}" + packs->RatioSeparator("PACK ID 1002") + "\r\n{B,20,N,1|"), std::string::npos);
-  EXPECT_NE(jobs[0].find("|9,\"0412\"|35,\"LEVEL 2\"|19,\"(00)093123450000000029\"|"), std::string::npos);
+  EXPECT_TRUE(jobs[0].starts_with(packs->RatioSeparator("PACK ID 1001") + "\r\n{B,20,N,1|"))
+      << jobs[0];
+  EXPECT_NE(jobs[0].find("|}" + packs->RatioSeparator("PACK ID 1002") + "\r\n{B,20,N,1|"),
+            std::string::npos);
+  EXPECT_NE(jobs[0].find("|9,\"0412\"|35,\"LEVEL 2\"|19,\"(00)093123450000000029\"|"),
+            std::string::npos);
 }
 
 }  // namespace

@@ -8,13 +8,15 @@
 
 namespace quendal::test {
 
-std::string DrawnPage(LabelInterface& label, const std::shared_ptr<MemoryObject<host::System>>& system,
+std::string DrawnPage(LabelInterface& label,
+                      const std::shared_ptr<MemoryObject<host::System>>& system,
                       const Ref<host::Pack>& pack, int dpi) {
   namespace fs = std::filesystem;
   TempFolder root;
   const fs::path printer = fs::path(root.path()) / "Office Laser";
   fs::create_directories(printer);
-  AppendFile((printer / "printer.ini").string(), "dpi=" + std::to_string(dpi) + "\nheight_mm=210\n");
+  AppendFile((printer / "printer.ini").string(),
+             "dpi=" + std::to_string(dpi) + "\nheight_mm=210\n");
   const auto previous = SetSpooler(std::make_shared<DirectorySpooler>(root.path()));
   const Var language = system->fields["PrinterLanguage"];
   system->fields["PrinterLanguage"] = "WinPCL";

@@ -10,7 +10,8 @@
 namespace quendal::test {
 
 // The page of the pack's label drawn at `dpi`; empty when nothing was drawn.
-std::string DrawnPage(LabelInterface& label, const std::shared_ptr<MemoryObject<host::System>>& system,
+std::string DrawnPage(LabelInterface& label,
+                      const std::shared_ptr<MemoryObject<host::System>>& system,
                       const Ref<host::Pack>& pack, int dpi);
 
 }  // namespace quendal::test

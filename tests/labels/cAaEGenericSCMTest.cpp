@@ -1,10 +1,9 @@
-#include "labels/cAaEGenericSCM.h"
-
 #include <gtest/gtest.h>
 
 #include <algorithm>
 #include <set>
 
+#include "labels/cAaEGenericSCM.h"
 #include "tests/labels/DrawnPage.h"
 #include "tests/labels/LabelFixture.h"
 #include "tests/support/Barcodes.h"
@@ -24,17 +23,21 @@ const std::string kConsignment =
     "C,415,220,0,3,1,1,B,L,0,0,\"7.50 KG\"|C,385,220,0,3,1,1,B,L,0,0,\"2 of 3\"|"
     "C,345,15,0,1,1,1,O,L,0,0,\"Date Packed 14/03/24\"|";
 const std::string kSender =
-    "C,305,12,0,2,1,1,B,L,0,0,\"Acme Apparel Pty Ltd\"|C,289,12,0,1,1,1,O,L,0,0,\"12 Example Road\"|"
-    "C,277,12,0,1,1,1,O,L,0,0,\"DANDENONG SOUTH VIC\"|C,250,115,0,1,1,1,B,L,0,0,\"PO PO778812 REL# 2\"|"
+    "C,305,12,0,2,1,1,B,L,0,0,\"Acme Apparel Pty Ltd\"|C,289,12,0,1,1,1,O,L,0,0,\"12 Example "
+    "Road\"|"
+    "C,277,12,0,1,1,1,O,L,0,0,\"DANDENONG SOUTH VIC\"|C,250,115,0,1,1,1,B,L,0,0,\"PO PO778812 REL# "
+    "2\"|"
     "C,236,115,0,1,1,1,B,L,0,0,\"SO SO10045\"|C,212,12,0,1,1,1,O,L,0,0,\"\"|"
     "C,198,12,0,1,1,1,O,L,0,0,\"\"|";
 const std::string kBottom =
     "C,95,12,0,3,2,2,B,L,0,0,\"3148\"|C,55,12,0,3,1,1,B,L,0,0,\"VIC\"|"
     "C,18,185,0,1,1,1,B,L,0,0,\"OUH00002\"|B,1,8,F,35,179,8,6,100,8,L,0|R,1,\"OUH00002\"|";
 const std::string kFrame =
-    "Q,175,351,591,385,4,\"11111111\"|Q,470,5,591,345,4,\"11111111\"|Q,330,5,465,345,4,\"11111111\"|"
+    "Q,175,351,591,385,4,\"11111111\"|Q,470,5,591,345,4,\"11111111\"|Q,330,5,465,345,4,"
+    "\"11111111\"|"
     "Q,175,5,325,345,4,\"11111111\"|C,585,357,0,3,1,1,B,L,0,3,\"AUSTRALIAN AIR EXPRESS\"|"
-    "C,575,12,0,1,1,1,O,L,0,0,\"AUSTALIAN AIR EXPRESS DELIVER TO:\"|C,415,150,0,1,1,1,O,L,0,0,\"WEIGHT\"|"
+    "C,575,12,0,1,1,1,O,L,0,0,\"AUSTALIAN AIR EXPRESS DELIVER "
+    "TO:\"|C,415,150,0,1,1,1,O,L,0,0,\"WEIGHT\"|"
     "C,250,12,0,1,1,1,O,L,0,0,\"SENDER REF: \"|C,445,150,0,1,1,1,O,L,0,0,\"C/N:\"|}";
 const std::string kOneLabel = "{B,460,N,1|E,1,0,1,1,0,1|}";
 const std::string kSecondCarton = kReceiver + kConsignment + kSender + kBottom + kFrame + kOneLabel;
@@ -80,10 +83,12 @@ TEST_F(AaEGenericTest, EveryLabelCarriesItsWholeFormatAndNothingWaitsOnThePrinte
 }
 
 TEST_F(AaEGenericTest, HostTextsCannotBreakTheFormatTheyAreWrittenInto) {
-  host.Make<host::Receiver>({{"Code", "0555"}, {"PartnerId", 1}, {"Name", "Bob's \"Best\" | {Shop}\r\n2"}});
+  host.Make<host::Receiver>(
+      {{"Code", "0555"}, {"PartnerId", 1}, {"Name", "Bob's \"Best\" | {Shop}\r\n2"}});
   second->fields["StoreCode"] = "0555";
   const std::string job = Printed(second);
-  EXPECT_TRUE(job.starts_with("{F,460,A,R,E,600,400,\"AAE\"|C,550,12,0,2,1,1,B,L,0,0,\"BOB'S BEST  SHOP  2\"|"))
+  EXPECT_TRUE(job.starts_with(
+      "{F,460,A,R,E,600,400,\"AAE\"|C,550,12,0,2,1,1,B,L,0,0,\"BOB'S BEST  SHOP  2\"|"))
       << job;
   // Still one format and one batch.
   EXPECT_EQ(std::count(job.begin(), job.end(), '{'), 2);

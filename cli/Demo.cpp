@@ -27,6 +27,9 @@ std::string DrawnPrinter(const std::string& carrier) { return carrier + " Drawn"
 std::string ZplPrinter(const std::string& carrier) { return carrier + " ZPL"; }
 // Label printers of the demo: 203 dpi, with a picture beside each job.
 constexpr const char* kThermalPrinter = "dpi=203\npreview=yes\n";
+// Ordinary printers of the demo: 300 dpi, on pages long enough for an
+// 8 x 4 inch label.
+constexpr const char* kOrdinaryPrinter = "dpi=300\nheight_mm=210\n";
 
 // Marks a folder the demo made, so a later run may replace what is in it.
 constexpr const char* kMarker = ".quendal-demo";
@@ -121,7 +124,7 @@ int RunDemo(const std::string& out, std::ostream& cout, bool asJson) {
     // An ordinary printer per carrier, on which one label is drawn as a picture.
     const fs::path drawn = root / "spool" / SafeFileName(DrawnPrinter(carrier.name));
     fs::create_directories(drawn);
-    std::ofstream(drawn / "printer.ini") << "dpi=300\n";
+    std::ofstream(drawn / "printer.ini") << kOrdinaryPrinter;
   }
   fs::create_directories(root / "spool" / SafeFileName(data.documentPrinter));
   for (const DemoFile& file : data.files) {
@@ -214,7 +217,7 @@ int RunDemo(const std::string& out, std::ostream& cout, bool asJson) {
           if (auto* drawn = as<LabelInterface>(drawnObject.object)) {
             const std::string printer = DrawnPrinter(carrier == "any" ? "Any" : carrier);
             fs::create_directories(root / "spool" / SafeFileName(printer));
-            std::ofstream(root / "spool" / SafeFileName(printer) / "printer.ini") << "dpi=300\n";
+            std::ofstream(root / "spool" / SafeFileName(printer) / "printer.ini") << kOrdinaryPrinter;
             const LabelRun labelRun =
                 PrintLabels(*drawn, OverrideSystem(system, "PrinterLanguage", Var("WinPCL")), printer,
                             {conNotes.front()->Packs()->Item(1)}, std::nullopt);

@@ -28,7 +28,7 @@ constexpr std::array kAccounts = {
     CarrierAccount{"VicExpress", "VEX", "60056789", "", "", "MET"},
     CarrierAccount{"VLO", "VLO", "70067890", "", "", "GEN"},
     CarrierAccount{"Toll", "TOL", "80078901", "", "", "GEN"},
-    CarrierAccount{"AaE", "AAE", "90089012", "", "", "EXP"},
+    CarrierAccount{"AaE", "AAE", "90089012", "", "", "OVERNIGHT"},
     CarrierAccount{"DFE", "DFE", "40217", "", "", "OVN"},
     CarrierAccount{"Hunter", "HUN", "11090123", "", "", "GEN"},
     CarrierAccount{"Allied Express", "ALX", "12001234", "", "", "ROAD"},
@@ -296,9 +296,11 @@ DemoData BuildDemoData(const std::string& root, DateTime now) {
     const double roundedWeight = static_cast<double>(static_cast<long long>(weight * 100 + 0.5)) / 100;
     const double roundedCube = static_cast<double>(static_cast<long long>(cube * 1000 + 0.5)) / 1000;
     const Store& deliverTo = kStores[static_cast<std::size_t>(receiverId - 1)];
+    // Every fourth consignment goes express, and so does each postal carrier's second one, so
+    // that both of the postal labels print.
     doc["ConNotes"].push_back({{"ConNoteId", conNoteId}, {"ConNoteNo", code + Padded(12345 + i, 8)},
                                {"ConNoteDate", Iso(at)}, {"Service", services[static_cast<std::size_t>(carrierIndex)]},
-                               {"ServiceLevel", i % 4 == 3 ? "EXPRESS" : "STANDARD"}, {"CarrierPrefix", code},
+                               {"ServiceLevel", i % 4 == 3 || (postal && i >= carrierCount) ? "EXPRESS" : "STANDARD"}, {"CarrierPrefix", code},
                                {"Weight", roundedWeight}, {"Volume", roundedCube}, {"Cube", roundedCube},
                                {"CubicTotal", nullptr}, {"CubicOverride", nullptr},
                                {"DeliveryInstructions", viaDc ? "Deliver to dock 3" : "Rear loading bay"},

@@ -8,6 +8,16 @@ namespace quendal {
 std::unique_ptr<Component> MakeStarTrackGenericSCM();
 std::unique_ptr<Component> MakeMayneCMLSCM();
 std::unique_ptr<Component> MakeTollMYERSCM();
+std::unique_ptr<Component> MakeAaEGenericSCM();
+std::unique_ptr<Component> MakeAustPostSCM();
+std::unique_ptr<Component> MakeAustPostDespatchSCM();
+std::unique_ptr<Component> MakeDFESCM();
+std::unique_ptr<Component> MakeDFESCMWinPCL();
+std::unique_ptr<Component> MakeDFESCMsscc();
+std::unique_ptr<Component> MakeSCMnoSSCC();
+std::unique_ptr<Component> MakeHunterGenericSCM();
+std::unique_ptr<Component> MakeIFSDJsSCM();
+std::unique_ptr<Component> MakeIFSAPISCM();
 std::unique_ptr<Component> MakeeParcelManifestxml();
 std::unique_ptr<Component> MakeeParcelManifestEODxml();
 std::unique_ptr<Component> MakeStarTrackDAcln();
@@ -53,13 +63,13 @@ constexpr std::array kCatalogue = {
     CatalogueEntry{"clsStarTrackGenericSCM", Label, "StarTrack", "any retailer (reference class)",
                    MakeStarTrackGenericSCM},
     CatalogueEntry{"clsTollGenericSCM", Label, "Toll", "any retailer", nullptr},
-    CatalogueEntry{"clsAaEGenericSCM", Label, "AaE", "any retailer", nullptr},
+    CatalogueEntry{"clsAaEGenericSCM", Label, "AaE", "any retailer", MakeAaEGenericSCM},
     CatalogueEntry{"clsAaEES610", Rows, "AaE", "ES610 file", MakeAaEES610},
     CatalogueEntry{"clsDFEDAxml", Consignment, "DFE",
                    "XML despatch advice, dangerous goods declaration", MakeDFEDAxml},
-    CatalogueEntry{"clsDFESCM", Label, "DFE", "any retailer", nullptr},
+    CatalogueEntry{"clsDFESCM", Label, "DFE", "any retailer", MakeDFESCM},
     CatalogueEntry{"clsHunterDA", Consignment, "Hunter", "despatch file", MakeHunterDA},
-    CatalogueEntry{"clsHunterGenericSCM", Label, "Hunter", "any retailer", nullptr},
+    CatalogueEntry{"clsHunterGenericSCM", Label, "Hunter", "any retailer", MakeHunterGenericSCM},
     CatalogueEntry{"clsStarTrackBigWSCM", Label, "StarTrack", "BigW", nullptr},
     CatalogueEntry{"clsTollBigWSCM", Label, "Toll", "BigW", nullptr},
     CatalogueEntry{"clsStarTrackHSSCM", Label, "StarTrack", "HS", nullptr},
@@ -69,16 +79,17 @@ constexpr std::array kCatalogue = {
     CatalogueEntry{"clsAlliedExpressSEDIP", Consignment, "Allied Express", "SEDIP file",
                    MakeAlliedExpressSEDIP},
     CatalogueEntry{"clsStarTrackRebelSCM", Label, "StarTrack", "Rebel", nullptr},
-    CatalogueEntry{"clsIFSAPISCM", Label, "IFS", "any retailer", nullptr},
-    CatalogueEntry{"clsIFSDJsSCM", Label, "IFS", "David Jones", nullptr},
-    CatalogueEntry{"clsAustPostSCM", Label, "Australia Post", "article-id labels", nullptr},
+    CatalogueEntry{"clsIFSAPISCM", Label, "IFS", "any retailer", MakeIFSAPISCM},
+    CatalogueEntry{"clsIFSDJsSCM", Label, "IFS", "David Jones", MakeIFSDJsSCM},
+    CatalogueEntry{"clsAustPostSCM", Label, "Australia Post", "article-id labels",
+                   MakeAustPostSCM},
     CatalogueEntry{"clseParcelManifestxml", Rows, "Australia Post eParcel", "PCMS manifest",
                    MakeeParcelManifestxml},
-    CatalogueEntry{"clsSCMnoSSCC", Label, "any", "label without SSCC", nullptr},
+    CatalogueEntry{"clsSCMnoSSCC", Label, "any", "label without SSCC", MakeSCMnoSSCC},
     CatalogueEntry{"clsStarTrackSpotlightSCM", Label, "StarTrack", "Spotlight", nullptr},
     CatalogueEntry{"clsStarTrackBigWERSCM", Label, "StarTrack", "BigW", nullptr},
-    CatalogueEntry{"clsDFESCMWinPCL", Label, "DFE", "drawn label", nullptr},
-    CatalogueEntry{"clsDFESCMsscc", Label, "DFE", "SSCC label", nullptr},
+    CatalogueEntry{"clsDFESCMWinPCL", Label, "DFE", "drawn label", MakeDFESCMWinPCL},
+    CatalogueEntry{"clsDFESCMsscc", Label, "DFE", "SSCC label", MakeDFESCMsscc},
     CatalogueEntry{"clsStarTrackManifestcln", Rows, "StarTrack",
                    "manifest CLN, consolidated manifest, dangerous goods", MakeStarTrackManifestcln},
     CatalogueEntry{"clsDFEDAManifestxml", Rows, "DFE",
@@ -92,7 +103,7 @@ constexpr std::array kCatalogue = {
                    MakeIpecDA1250EOD},
     CatalogueEntry{"clsTollNZSCM", Label, "Toll", "NZ", nullptr},
     CatalogueEntry{"clsAustPostDespatchSCM", Label, "Australia Post", "despatch article-id labels",
-                   nullptr},
+                   MakeAustPostDespatchSCM},
     CatalogueEntry{"clseParcelManifestEODxml", Rows, "Australia Post eParcel", "PCMS end of day",
                    MakeeParcelManifestEODxml},
     CatalogueEntry{"clsTollDJsSCM", Label, "Toll", "David Jones", nullptr},

@@ -109,11 +109,11 @@ bool LabelPrinter::Init(const Ref<host::System>& system, const std::string& aPri
   if (!proc([&] { language = system_->PrinterLanguage().Text(); })) return result;
   if (!DownloadsFormat(language)) return result = true;
 
-  std::string format;
-  if (!proc([&] { format = PrintVPCLII(); })) return result;
   ChannelScope scope(*this);
   bool opened = false;
   if (!proc([&] { opened = OpenPtr(); }) || !opened) return result;
+  std::string format;
+  if (!proc([&] { format = FormatDownload(); })) return result;
   if (!proc([&] { WriteChannel(format); })) return result;
   if (!proc([&] { ClosePtr(); })) return result;
   return result = true;
@@ -147,27 +147,55 @@ bool LabelPrinter::PrintLabel(const Ref<host::Pack>& aPack, std::optional<std::i
 std::string LabelPrinter::PrintVPCLII() {
   std::string result;
   Procedure proc = Guard("Function PrintVPCLII");
-  proc([&] { result = vpcl::RenderFormat(formatNumber_, layout_.format); });
+  proc([&] { result = vpcl::RenderFormat(formatNumber_, LabelFormat()); });
   return result;
 }
+
+vpcl::Format LabelPrinter::LabelFormat() { return layout_.format; }
+
+std::string LabelPrinter::FormatDownload() { return PrintVPCLII(); }
+
+std::string LabelPrinter::LabelJob() { return VPCLIIBatchCommand(); }
 
 std::string LabelPrinter::VPCLIIBatchCommand() {
   std::string result;
   Procedure proc = Guard("Function VPCLIIBatchCommand");
   std::string batchMode;
   if (!proc([&] { batchMode = system_->PrinterBatchMode().Text(); })) return result;
-  proc([&] {
-    vpcl::Batch batch(formatNumber_, copies_, batchMode);
-    for (const BatchField& field : layout_.batch) {
-      if (field.sent && !field.sent(values_)) continue;
-      if (field.value)
-        batch.Field(field.number, values_.*field.value);
-      else
-        batch.Field(field.number, field.data(values_));
-    }
-    result = std::move(batch).Finish();
-  });
+  proc([&] { result = BatchOf(batchMode); });
   return result;
+}
+
+std::string LabelPrinter::BatchOf(std::string_view batchMode) const {
+  vpcl::Batch batch(formatNumber_, copies_, batchMode);
+  for (const BatchField& field : layout_.batch) {
+    if (field.sent && !field.sent(values_)) continue;
+    if (field.value)
+      batch.Field(field.number, values_.*field.value);
+    else
+      batch.Field(field.number, field.data(values_));
+  }
+  return std::move(batch).Finish();
+}
+
+bool LabelPrinter::ReadPlace(Procedure& proc, std::int32_t& place, std::int32_t& count) {
+  place = 0;
+  count = 0;
+  return proc([&] {
+    if (pack_->ASNId().IsNull()) return;
+    const Ref<host::PackList> packs = pack_->ConNote()->Packs();
+    count = packs->Count();
+    place = PlaceAmong(*packs, pack_->PackId());
+    if (place == 0) place = ++count;
+    values_.PackOfPacks = std::to_string(place) + " of " + std::to_string(count);
+  });
+}
+
+std::int32_t LabelPrinter::PlaceAmong(host::PackList& packs, const Var& packId) {
+  const std::int32_t count = packs.Count();
+  for (std::int32_t i = 1; i <= count; ++i)
+    if (SamePackId(packs.Item(i)->PackId(), packId)) return i;
+  return 0;
 }
 
 std::int32_t LabelPrinter::SpooledJobCount(std::int32_t aPrinterHandle) {
@@ -292,9 +320,11 @@ void LabelPrinter::PrintWinPCL() {
   Procedure proc = Guard("Sub PrintWinPCL");
   std::string format;
   std::string batch;
+  // The format and the batch alone, even for a class whose batch command
+  // carries its format along.
   if (!proc([&] {
         format = PrintVPCLII();
-        batch = VPCLIIBatchCommand();
+        batch = BatchOf(system_->PrinterBatchMode().Text());
       }))
     return;
   proc([&] { DrawOnChannel(format, batch); });
@@ -345,7 +375,7 @@ bool LabelPrinter::WriteLabel() {
           return;
         }
         if (language == kVPCLII) {
-          if (handle_ != 0) WriteChannel(VPCLIIBatchCommand());
+          if (handle_ != 0) WriteChannel(LabelJob());
           return;
         }
         if (!WriteOtherLanguage(language)) WriteLog(0, "WriteLabel", language + " unknown.");
@@ -442,15 +472,8 @@ bool LabelPrinter::FillValues(Procedure& proc) {
            // The pack's place among its consignment's packs; the last place
            // when it is not among them.
            const Ref<host::PackList> packs = ConNote().Packs();
-           const Var id = pack_->PackId();
-           const std::int32_t count = packs->Count();
-           std::int32_t ordinal = count;
-           for (std::int32_t i = 1; i <= count; ++i) {
-             if (SamePackId(packs->Item(i)->PackId(), id)) {
-               ordinal = i;
-               break;
-             }
-           }
+           std::int32_t ordinal = PlaceAmong(*packs, pack_->PackId());
+           if (ordinal == 0) ordinal = packs->Count();
            if (ordinal > INT16_MAX || ordinal < INT16_MIN) throw Error(err::kOverflow);
            v.PackOrdinal = static_cast<std::int16_t>(ordinal);
          }) &&

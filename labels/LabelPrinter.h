@@ -120,6 +120,25 @@ class LabelPrinter : public virtual LabelInterface, public ComponentBase {
   // open channel ("ZPL" for a class with a ZPL label); false when the class
   // does not speak it.
   virtual bool WriteOtherLanguage(const std::string& language);
+  // The format of the current label: the layout's own, unless the class
+  // picks one by the label's values or builds it from them.
+  virtual vpcl::Format LabelFormat();
+  // What Init sends to a printer that keeps formats: the format.
+  virtual std::string FormatDownload();
+  // What one label's VPCL II job sends: the batch.
+  virtual std::string LabelJob();
+  // The current label's batch, with the printer's batch mode.
+  std::string BatchOf(std::string_view batchMode) const;
+
+  // The 1-based place of the pack with this id among the packs; 0 when it
+  // is not among them.
+  static std::int32_t PlaceAmong(host::PackList& packs, const Var& packId);
+  // The current pack's place among its consignment's packs and their
+  // number, and "k of N" in the values, as a step of the caller's
+  // procedure. A pack its consignment does not list yet counts as joining
+  // it last; a pack without a consignment has place and number 0 and no
+  // "k of N".
+  bool ReadPlace(Procedure& proc, std::int32_t& place, std::int32_t& count);
 
   // Gives up the channel when the procedure holding it ends early (or has
   // nothing to print), so that no half-written or empty job is queued.

@@ -64,6 +64,13 @@ struct LabelValues {
   std::string ZoneDeptA;
   std::string ZoneDeptB;
   std::string ZoneDeptC;
+
+  // What the postal labels print besides; empty unless a class fills them.
+  std::string ConsignmentNumber;     // the consignment as the postal manifest names it
+  std::string ArticleId;             // the carton's article identifier, check digit included
+  std::string PackOfPacks;           // "2 of 3": the carton's place among its consignment's
+  std::string PacksLine;             // "3 PC": the consignment's number of cartons
+  std::string DeliveryInstructions;
 };
 
 }  // namespace quendal

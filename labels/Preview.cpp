@@ -175,6 +175,8 @@ Label VpclPage(const VpclLabel& vpcl, int dpi) {
   // Formats are measured in hundredths of an inch ("E"), or tenths of a
   // millimetre where the header says "M".
   const double u = Trim(vpcl.storage) == "M" ? dpi / 254.0 : dpi / 100.0;
+  // The printer's fonts keep their size whatever unit the format measures in.
+  const double fontUnit = dpi / 100.0;
   const double length = vpcl.length;
   Label label;
   label.width = vpcl.width * u;
@@ -203,12 +205,12 @@ Label VpclPage(const VpclLabel& vpcl, int dpi) {
       t.anchor = S(at + 7) == "R" ? Anchor::LineEnd : Anchor::LineStart;
       // A right-aligned field ends where its longest text would end.
       if (!constant && t.anchor == Anchor::LineEnd)
-        t.x = X(N(at + 1) + std::max(0.0, N(2)) * metrics.width * across);
+        t.x = X(N(at + 1) + std::max(0.0, N(2)) * metrics.width * across * fontUnit / u);
       // Rotation counts quarter turns anticlockwise: 3 runs the text down the label.
       const int rotation = static_cast<int>(N(constant ? 10 : 13));
       t.turns = (4 - ((rotation % 4) + 4) % 4) % 4;
-      t.font.height = static_cast<int>(std::lround(std::min(kMaxPixels, metrics.height * down * u)));
-      t.font.width = static_cast<int>(std::lround(std::min(kMaxPixels, metrics.width * across * u)));
+      t.font.height = static_cast<int>(std::lround(std::min(kMaxPixels, metrics.height * down * fontUnit)));
+      t.font.width = static_cast<int>(std::lround(std::min(kMaxPixels, metrics.width * across * fontUnit)));
       t.font.weight = metrics.weight;
       t.font.face = std::string(kFace);
       t.reversed = S(at + 6) == "W";

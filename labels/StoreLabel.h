@@ -8,7 +8,6 @@
 
 #include <array>
 #include <string_view>
-#include <utility>
 
 #include "labels/LabelPrinter.h"
 
@@ -58,21 +57,11 @@ inline constexpr std::array<vpcl::Packet, 10> kStoreLabelBottom = {
     vpcl::Field{31, 22, 22, 60, 1, 2, 1, 'B', 'L'},
 };
 
-namespace detail {
-template <std::size_t N, std::size_t... I>
-constexpr std::array<vpcl::Packet, sizeof...(I)> StoreFormat(const std::array<vpcl::Packet, N>& middle,
-                                                             std::index_sequence<I...>) {
-  constexpr std::size_t top = kStoreLabelTop.size();
-  return {{(I < top ? kStoreLabelTop[I] : I < top + N ? middle[I - top] : kStoreLabelBottom[I - top - N])...}};
-}
-}  // namespace detail
-
 // A store label format: the common top, the class's own middle (the TO and
 // FOR blocks, the SSCC, order and zones), the common bottom.
 template <std::size_t N>
 constexpr auto StoreLabelFormat(const std::array<vpcl::Packet, N>& middle) {
-  return detail::StoreFormat(
-      middle, std::make_index_sequence<kStoreLabelTop.size() + N + kStoreLabelBottom.size()>());
+  return vpcl::Join(kStoreLabelTop, middle, kStoreLabelBottom);
 }
 
 // The ZPL label of the store-label classes, in dots of a 203 dpi printer

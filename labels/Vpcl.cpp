@@ -9,41 +9,56 @@ namespace quendal::vpcl {
 
 namespace {
 
+// Writes one packet. The plain parameters gather in a small buffer that
+// goes to the text in one append, before a quoted text and at the end: a
+// format is a few hundred parameters, and some classes render theirs with
+// every label.
 class Writer {
  public:
   explicit Writer(std::string& out) : out_(out) {}
   Writer& Letter(char c) {
     Separate();
-    out_ += c;
+    buf_[n_++] = c;
     return *this;
   }
   Writer& Number(long value) {
     Separate();
-    char buf[24];
-    const auto end = std::to_chars(buf, buf + sizeof buf, value).ptr;
-    out_.append(buf, end);
+    n_ = static_cast<std::size_t>(std::to_chars(buf_ + n_, buf_ + sizeof buf_, value).ptr - buf_);
     return *this;
   }
   Writer& Raw(std::string_view text) {
     Separate();
+    Flush();
     out_ += text;
     return *this;
   }
   Writer& Quoted(std::string_view text) {
     Separate();
-    out_ += '"';
+    buf_[n_++] = '"';
+    Flush();
     AppendFieldData(out_, text);
     out_ += '"';
     return *this;
   }
-  void End() { out_ += '|'; }
+  void End() {
+    buf_[n_++] = '|';
+    Flush();
+  }
 
  private:
+  // Room for the longest number and its separator is always left.
   void Separate() {
-    if (started_) out_ += ',';
+    if (n_ > sizeof buf_ - 24) Flush();
+    if (started_) buf_[n_++] = ',';
     started_ = true;
   }
+  void Flush() {
+    out_.append(buf_, n_);
+    n_ = 0;
+  }
   std::string& out_;
+  char buf_[128];
+  std::size_t n_ = 0;
   bool started_ = false;
 };
 
@@ -137,7 +152,7 @@ std::string FieldData(std::string_view text) {
 
 std::string RenderFormat(std::string_view number, const Format& format) {
   std::string out;
-  out.reserve(64 + format.packets.size() * 40);
+  out.reserve(64 + format.packets.size() * 64);
   out += '{';
   Writer(out).Letter('F').Raw(FieldData(number)).Letter('A').Letter('R').Letter(format.storage)
       .Number(format.length).Number(format.width).Quoted(format.name).End();
@@ -159,7 +174,7 @@ Batch& Batch::Field(int number, std::string_view data) {
   // `number,"data"|`, appended in place: a batch has a few dozen fields per label.
   char digits[24];
   const auto end = std::to_chars(digits, digits + sizeof digits, number).ptr;
-  text_.append(digits, end);
+  text_.append(digits, static_cast<std::size_t>(end - digits));
   text_.append(",\"", 2);
   AppendFieldData(text_, data);
   text_.append("\"|", 2);

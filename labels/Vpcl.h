@@ -8,6 +8,9 @@
 // bottom edge, columns rightward from its left edge.
 #pragma once
 
+#include <array>
+#include <cstddef>
+#include <utility>
 #include <span>
 #include <string>
 #include <string_view>
@@ -56,12 +59,32 @@ struct Graphic {
 
 using Packet = std::variant<Line, Box, Text, Field, Barcode, FixedData, Graphic>;
 
+namespace detail {
+template <class T, std::size_t N, std::size_t M, std::size_t... I>
+constexpr std::array<T, N + M> Join(const std::array<T, N>& a, const std::array<T, M>& b,
+                                    std::index_sequence<I...>) {
+  return {{(I < N ? a[I] : b[I - N])...}};
+}
+}  // namespace detail
+
+// Lists one after the other: a format's packets (or a batch's fields) put
+// together from pieces that several formats share.
+template <class T, std::size_t N, std::size_t M>
+constexpr std::array<T, N + M> Join(const std::array<T, N>& a, const std::array<T, M>& b) {
+  return detail::Join(a, b, std::make_index_sequence<N + M>());
+}
+template <class T, std::size_t N, std::size_t M, class... Rest>
+constexpr auto Join(const std::array<T, N>& a, const std::array<T, M>& b, const Rest&... rest) {
+  return Join(Join(a, b), rest...);
+}
+
 struct Format {
   std::string_view name;
   int length;  // header units, along the rows
   int width;   // along the columns
   std::span<const Packet> packets;
-  char storage = 'E';  // the header's memory letter
+  // The header's unit letter: "E" hundredths of an inch, "M" tenths of a millimetre.
+  char storage = 'E';
 };
 
 // "{F,<number>,A,R,<storage>,<length>,<width>,"<name>"|" + packets + "}".

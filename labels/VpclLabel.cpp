@@ -69,6 +69,9 @@ int Whole(double v) { return static_cast<int>(RoundHalfEven(v)); }
 
 constexpr double kUnitsPerValue = 25.0 / 100.0;
 
+// A barcode field whose data the format fixes ("B,n,max,F,...").
+bool IsFixed(const VpclElement& e) { return e.kind == "B" && Trim(Param(e.params, 3)) == "F"; }
+
 }  // namespace
 
 VpclLabel ReadVpclLabel(std::string_view format, std::string_view batch) {
@@ -87,22 +90,34 @@ VpclLabel ReadVpclLabel(std::string_view format, std::string_view batch) {
     VpclElement element{Param(params, 0), params, {}};
     if (element.kind == "C") element.data = Param(params, 11);
     if (element.kind == "T" || element.kind == "B") byField[Param(params, 1)] = label.elements.size();
+    // The data of a fixed-data barcode, given in the format itself.
+    if (element.kind == "R") {
+      auto it = byField.find(Param(params, 1));
+      if (it != byField.end()) label.elements[it->second].data = Param(params, 2);
+    }
     label.elements.push_back(std::move(element));
   }
   for (const auto& params : Packets(batch)) {
     const std::string& first = Param(params, 0);
     if (first == "B" || first == "E") continue;
     auto it = byField.find(first);
-    if (it != byField.end()) label.elements[it->second].data = Param(params, 1);
+    // A fixed-data barcode keeps the data of its format.
+    if (it != byField.end() && !IsFixed(label.elements[it->second]))
+      label.elements[it->second].data = Param(params, 1);
   }
   return label;
 }
 
 LabelDrawing LayOutLabel(const VpclLabel& label) {
   LabelDrawing drawing;
-  const double h = label.length * kUnitsPerValue;
+  // A format measured in hundredths of an inch takes a quarter of a label
+  // unit per value; one measured in tenths of a millimetre ("M" in its
+  // header) takes 2.54 times less, so that it is drawn at its own size and
+  // fits the page as the same label in inches does.
+  const double perValue = Trim(label.storage) == "M" ? kUnitsPerValue / 2.54 : kUnitsPerValue;
+  const double h = label.length * perValue;
   drawing.height = h;
-  drawing.width = label.width * kUnitsPerValue;
+  drawing.width = label.width * perValue;
   for (const VpclElement& e : label.elements) {
     const auto& p = e.params;
     if (e.kind == "C" || e.kind == "T") {
@@ -110,8 +125,8 @@ LabelDrawing LayOutLabel(const VpclLabel& label) {
       const std::size_t at = e.kind == "C" ? 1 : 4;
       if (e.data.empty()) continue;
       LabelText t;
-      t.x = Whole(Number(p, at + 1) * kUnitsPerValue);
-      t.y = Whole(h - Number(p, at) * kUnitsPerValue);
+      t.x = Whole(Number(p, at + 1) * perValue);
+      t.y = Whole(h - Number(p, at) * perValue);
       const int font = static_cast<int>(Number(p, at + 3));
       const double f1 = Number(p, at + 4);
       const double f2 = Number(p, at + 5);
@@ -134,11 +149,11 @@ LabelDrawing LayOutLabel(const VpclLabel& label) {
     } else if (e.kind == "L") {
       // L,S,row1,col1,row2,col2,thickness,pattern; rows lowered by 3 units.
       LabelLine l;
-      l.x1 = Whole(Number(p, 3) * kUnitsPerValue);
-      l.y1 = Whole(h - (Number(p, 2) * kUnitsPerValue - 3));
-      l.x2 = Whole(Number(p, 5) * kUnitsPerValue);
-      l.y2 = Whole(h - (Number(p, 4) * kUnitsPerValue - 3));
-      l.width = static_cast<double>(RoundHalfEven(Number(p, 6) / 4));
+      l.x1 = Whole(Number(p, 3) * perValue);
+      l.y1 = Whole(h - (Number(p, 2) * perValue - 3));
+      l.x2 = Whole(Number(p, 5) * perValue);
+      l.y2 = Whole(h - (Number(p, 4) * perValue - 3));
+      l.width = static_cast<double>(RoundHalfEven(Number(p, 6) * perValue));
       drawing.items.emplace_back(l);
     } else if (e.kind == "B") {
       // B,n,max,V,row,col,8,density,height,8,L,0; the row is the bars' bottom, lowered by 4 units.
@@ -146,9 +161,9 @@ LabelDrawing LayOutLabel(const VpclLabel& label) {
       LabelBarcode b;
       const std::string density = Trim(Param(p, 7));
       b.module = density == "8" ? 0.3 : density == "6" ? 0.4 : 0.5;
-      b.height = Whole(Number(p, 8) / 4);
-      b.left = Whole(Number(p, 5) * kUnitsPerValue);
-      b.bottom = h - (Number(p, 4) * kUnitsPerValue - 4);
+      b.height = Whole(Number(p, 8) * perValue);
+      b.left = Whole(Number(p, 5) * perValue);
+      b.bottom = h - (Number(p, 4) * perValue - 4);
       b.top = Whole(b.bottom - b.height);
       b.data = e.data;
       drawing.items.emplace_back(std::move(b));

@@ -48,7 +48,9 @@ cairo_status_t ReadFromString(void* closure, unsigned char* data, unsigned int l
 
 }  // namespace
 
-std::set<std::string> ReadGs1Barcodes(const std::string& png) {
+namespace {
+
+std::set<std::string> ReadBarcodes(const std::string& png, bool gs1Only) {
   std::string_view source(png);
   cairo_surface_t* image = cairo_image_surface_create_from_png_stream(ReadFromString, &source);
   std::set<std::string> found;
@@ -71,12 +73,21 @@ std::set<std::string> ReadGs1Barcodes(const std::string& png) {
                                   kBand, ZXing::ImageFormat::Lum);
       const auto result = ZXing::ReadBarcode(
           band, ZXing::DecodeHints().setFormats(ZXing::BarcodeFormat::Code128).setTryRotate(false));
-      if (result.isValid() && result.symbologyIdentifier() == "]C1")
+      if (!result.isValid()) continue;
+      if (result.symbologyIdentifier() == "]C1")
         found.insert(HumanReadable(result.text()));
+      else if (!gs1Only)
+        found.insert(result.text());
     }
   }
   cairo_surface_destroy(image);
   return found;
 }
+
+}  // namespace
+
+std::set<std::string> ReadGs1Barcodes(const std::string& png) { return ReadBarcodes(png, true); }
+
+std::set<std::string> ReadCode128Barcodes(const std::string& png) { return ReadBarcodes(png, false); }
 
 }  // namespace quendal::test

@@ -14,5 +14,8 @@ std::string HumanReadable(const std::string& text);
 // Every GS1-128 symbol on a PNG page, as human-readable element strings,
 // read band by band down the page.
 std::set<std::string> ReadGs1Barcodes(const std::string& png);
+// Every Code 128 symbol on a PNG page: GS1-128 ones as human-readable
+// element strings, others as the text they carry.
+std::set<std::string> ReadCode128Barcodes(const std::string& png);
 
 }  // namespace quendal::test

@@ -7,9 +7,12 @@
 #pragma once
 
 #include <array>
+#include <string>
 #include <string_view>
 #include <utility>
 
+#include "labels/Elements.h"
+#include "labels/Gs1.h"
 #include "labels/LabelPrinter.h"
 
 namespace quendal {
@@ -27,7 +30,64 @@ struct StoreLabelCuts {
 // order; 17 the panel text; 18-21 the zones C and A, B and the store
 // zone/department; 22-23 the (421)(90) barcode and its line; 24-29 dates,
 // user texts and the sales order; 30-31 the SSCC barcode and its line.
-extern const std::array<BatchField, 31> kStoreLabelBatch;
+namespace store {
+using V = const LabelValues&;
+// The (421)(90) barcode: the delivery location's postcode and the store's number.
+inline std::string ShipToStore(V v) {
+  return gs1::ShipToReferenceData(v.CountryCode, v.ReceiverPostcode, v.StoreText);
+}
+inline std::string ShipToStoreLine(V v) {
+  return gs1::ShipToReferenceText(v.CountryCode, v.ReceiverPostcode, v.StoreText);
+}
+}  // namespace store
+
+inline constexpr std::array<BatchField, 31> kStoreLabelBatch = {{
+    {1, &LabelValues::FromName},
+    {2, &LabelValues::FromLine3},
+    {3, &LabelValues::FromState},
+    {4, &LabelValues::CarrierName},
+    {5, &LabelValues::ConNoteNo},
+    {6, &LabelValues::BillOfLading},
+    {7, &LabelValues::LocationCode},
+    {8, &LabelValues::LocationNumber},
+    {9, &LabelValues::ReceiverLine},
+    {10, &LabelValues::ReceiverPostcode},
+    {11, &LabelValues::ForName},
+    {12, &LabelValues::StoreText},
+    {13, &LabelValues::ForLine},
+    {14, &LabelValues::ForPostcode},
+    {15, elements::SsccLine},
+    {16, &LabelValues::PurchaseOrderLine},
+    {17, &LabelValues::PanelText},
+    {18, &LabelValues::ZoneDeptC},
+    {19, &LabelValues::StoreZoneDept},
+    {20, &LabelValues::ZoneDeptA},
+    {21, &LabelValues::ZoneDeptB},
+    {22, store::ShipToStore},
+    {23, store::ShipToStoreLine},
+    {24, &LabelValues::PackedLine},
+    {25, &LabelValues::NotBeforeLine},
+    {26, &LabelValues::NotAfterLine},
+    {27, &LabelValues::UserText1},
+    {28, &LabelValues::UserText2},
+    {29, &LabelValues::SalesOrderLine},
+    {30, elements::Sscc},
+    {31, elements::SsccLine},
+}};
+
+// A batch without the fields a format leaves out, in the same order.
+template <std::size_t Drop, std::size_t N>
+constexpr std::array<BatchField, N - Drop> BatchWithout(const std::array<BatchField, N>& batch,
+                                                       const std::array<int, Drop>& numbers) {
+  std::array<BatchField, N - Drop> kept{batch[0]};
+  std::size_t at = 0;
+  for (const BatchField& field : batch) {
+    bool dropped = false;
+    for (int number : numbers) dropped = dropped || field.number == number;
+    if (!dropped) kept[at++] = field;
+  }
+  return kept;
+}
 
 // What every store label format begins with (a line at row 555 under the
 // sender and carrier block) and ends with (from row 350 down: the (421)(90)
@@ -81,16 +141,41 @@ constexpr auto StoreLabelFormat(const std::array<vpcl::Packet, N>& middle) {
 // the (421)(90) and (00) barcodes, one copy.
 extern const std::array<zpl::Piece, 37> kStoreLabelZpl;
 
-class StoreLabelPrinter : public LabelPrinter {
+// The store label's values, after the reference values: the consignment's
+// bill of lading, the delivery location, the store and the despatch's
+// zones; the consignment number cut to 12 and the carrier's name to 15
+// characters. Each read is a step of the caller's procedure.
+bool ReadStoreLabelValues(Procedure& proc, const Ref<host::Pack>& pack, LabelValues& values,
+                          StoreLabelCuts cuts);
+// The number of the store the goods are for (the pack's ship-to), four
+// digits, as StoreText.
+bool ReadStoreNumber(Procedure& proc, const Ref<host::Pack>& pack, LabelValues& values);
+
+// A store label class on the frame or on one of its extended forms
+// (PrintFileLabelPrinter, PackListLabelPrinter).
+template <class Base = LabelPrinter>
+class StoreLabel : public Base {
  protected:
-  StoreLabelPrinter(std::string_view className, const LabelLayout& layout, StoreLabelCuts cuts);
-  // The reference values, then the consignment's bill of lading, the
-  // delivery location, the store and the despatch's zones; the consignment
-  // number cut to 12 and the carrier's name to 15 characters.
-  bool FillValues(Procedure& proc) override;
+  StoreLabel(std::string_view className, const LabelLayout& layout, StoreLabelCuts cuts)
+      : Base(className, layout), cuts_(cuts) {}
+  bool FillValues(Procedure& proc) override {
+    return Base::FillValues(proc) && ReadStoreLabelValues(proc, this->pack_, this->values_, cuts_);
+  }
 
  private:
   StoreLabelCuts cuts_;
+};
+using StoreLabelPrinter = StoreLabel<>;
+
+// A carton label addressed as the reference label is, which also prints
+// the number of the store the goods are for (large, and under (90)).
+template <class Base = LabelPrinter>
+class StoreNumberLabel : public Base {
+ protected:
+  using Base::Base;
+  bool FillValues(Procedure& proc) override {
+    return Base::FillValues(proc) && ReadStoreNumber(proc, this->pack_, this->values_);
+  }
 };
 
 }  // namespace quendal

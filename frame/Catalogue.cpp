@@ -8,6 +8,22 @@ namespace quendal {
 std::unique_ptr<Component> MakeStarTrackGenericSCM();
 std::unique_ptr<Component> MakeMayneCMLSCM();
 std::unique_ptr<Component> MakeTollMYERSCM();
+std::unique_ptr<Component> MakeTollGenericSCM();
+std::unique_ptr<Component> MakeTollNZSCM();
+std::unique_ptr<Component> MakeMayneGenericSCM();
+std::unique_ptr<Component> MakeStarTrackCMLSCM();
+std::unique_ptr<Component> MakeTNTCMLSCM();
+std::unique_ptr<Component> MakeMayneCMLSCMLSCP();
+std::unique_ptr<Component> MakeStarTrackDJsSCM();
+std::unique_ptr<Component> MakeTollDJsSCM();
+std::unique_ptr<Component> MakeMayneDJsSCM();
+std::unique_ptr<Component> MakeStarTrackSpotlightSCM();
+std::unique_ptr<Component> MakeStarTrackBLSCM();
+std::unique_ptr<Component> MakeStarTrackBigWSCM();
+std::unique_ptr<Component> MakeTollBigWSCM();
+std::unique_ptr<Component> MakeStarTrackBigWERSCM();
+std::unique_ptr<Component> MakeStarTrackHSSCM();
+std::unique_ptr<Component> MakeStarTrackRebelSCM();
 std::unique_ptr<Component> MakeeParcelManifestxml();
 std::unique_ptr<Component> MakeeParcelManifestEODxml();
 std::unique_ptr<Component> MakeStarTrackDAcln();
@@ -25,23 +41,23 @@ constexpr std::array kCatalogue = {
     CatalogueEntry{"clsStarTrackDAcln", Consignment, "StarTrack",
                    "CLN consignment file, dangerous goods declaration", MakeStarTrackDAcln},
     CatalogueEntry{"clsTNTDAet11", Consignment, "TNT", "ET11 file", MakeTNTDAet11},
-    CatalogueEntry{"clsStarTrackCMLSCM", Label, "StarTrack", "CML", nullptr},
-    CatalogueEntry{"clsTNTCMLSCM", Label, "TNT", "CML", nullptr},
-    CatalogueEntry{"clsStarTrackDJsSCM", Label, "StarTrack", "David Jones", nullptr},
+    CatalogueEntry{"clsStarTrackCMLSCM", Label, "StarTrack", "CML", MakeStarTrackCMLSCM},
+    CatalogueEntry{"clsTNTCMLSCM", Label, "TNT", "CML", MakeTNTCMLSCM},
+    CatalogueEntry{"clsStarTrackDJsSCM", Label, "StarTrack", "David Jones", MakeStarTrackDJsSCM},
     CatalogueEntry{"clsMayneDAcl", Consignment, "Mayne", "CL file", nullptr},
-    CatalogueEntry{"clsMayneCMLSCMLSCP", Label, "Mayne", "CML", nullptr},
-    CatalogueEntry{"clsMayneDJsSCM", Label, "Mayne", "David Jones", nullptr},
+    CatalogueEntry{"clsMayneCMLSCMLSCP", Label, "Mayne", "CML", MakeMayneCMLSCMLSCP},
+    CatalogueEntry{"clsMayneDJsSCM", Label, "Mayne", "David Jones", MakeMayneDJsSCM},
     CatalogueEntry{"clsIpecDA1250", Consignment, "Ipec", "1250 file", nullptr},
-    CatalogueEntry{"clsStarTrackBLSCM", Label, "StarTrack", "BL", nullptr},
+    CatalogueEntry{"clsStarTrackBLSCM", Label, "StarTrack", "BL", MakeStarTrackBLSCM},
     CatalogueEntry{"clsIpecDA1256", Consignment, "Ipec", "1256 file", nullptr},
     CatalogueEntry{"clsVicExpressDAcln", Consignment, "VicExpress", "consignment file (\".CTN\")",
                    MakeVicExpressDAcln},
     CatalogueEntry{"clsVLODAcsv", Consignment, "VLO", "map-driven CSV file", MakeVLODAcsv},
     CatalogueEntry{"clsMayneCMLSCM", Label, "Mayne", "CML", MakeMayneCMLSCM},
-    CatalogueEntry{"clsMayneGenericSCM", Label, "Mayne", "any retailer", nullptr},
+    CatalogueEntry{"clsMayneGenericSCM", Label, "Mayne", "any retailer", MakeMayneGenericSCM},
     CatalogueEntry{"clsStarTrackGenericSCM", Label, "StarTrack", "any retailer (reference class)",
                    MakeStarTrackGenericSCM},
-    CatalogueEntry{"clsTollGenericSCM", Label, "Toll", "any retailer", nullptr},
+    CatalogueEntry{"clsTollGenericSCM", Label, "Toll", "any retailer", MakeTollGenericSCM},
     CatalogueEntry{"clsAaEGenericSCM", Label, "AaE", "any retailer", nullptr},
     CatalogueEntry{"clsAaEES610", Rows, "AaE", "ES610 file", nullptr},
     CatalogueEntry{"clsDFEDAxml", Consignment, "DFE",
@@ -49,23 +65,23 @@ constexpr std::array kCatalogue = {
     CatalogueEntry{"clsDFESCM", Label, "DFE", "any retailer", nullptr},
     CatalogueEntry{"clsHunterDA", Consignment, "Hunter", "despatch file", nullptr},
     CatalogueEntry{"clsHunterGenericSCM", Label, "Hunter", "any retailer", nullptr},
-    CatalogueEntry{"clsStarTrackBigWSCM", Label, "StarTrack", "BigW", nullptr},
-    CatalogueEntry{"clsTollBigWSCM", Label, "Toll", "BigW", nullptr},
-    CatalogueEntry{"clsStarTrackHSSCM", Label, "StarTrack", "HS", nullptr},
+    CatalogueEntry{"clsStarTrackBigWSCM", Label, "StarTrack", "BigW", MakeStarTrackBigWSCM},
+    CatalogueEntry{"clsTollBigWSCM", Label, "Toll", "BigW", MakeTollBigWSCM},
+    CatalogueEntry{"clsStarTrackHSSCM", Label, "StarTrack", "HS", MakeStarTrackHSSCM},
     CatalogueEntry{"clsTollMYERSCM", Label, "Toll", "Myer", MakeTollMYERSCM},
     CatalogueEntry{"clsTNTTransactionDAcsv", Consignment, "TNT", "map-driven CSV transaction file",
                    MakeTNTTransactionDAcsv},
     CatalogueEntry{"clsAlliedExpressSEDIP", Consignment, "Allied Express", "SEDIP file",
                    MakeAlliedExpressSEDIP},
-    CatalogueEntry{"clsStarTrackRebelSCM", Label, "StarTrack", "Rebel", nullptr},
+    CatalogueEntry{"clsStarTrackRebelSCM", Label, "StarTrack", "Rebel", MakeStarTrackRebelSCM},
     CatalogueEntry{"clsIFSAPISCM", Label, "IFS", "any retailer", nullptr},
     CatalogueEntry{"clsIFSDJsSCM", Label, "IFS", "David Jones", nullptr},
     CatalogueEntry{"clsAustPostSCM", Label, "Australia Post", "article-id labels", nullptr},
     CatalogueEntry{"clseParcelManifestxml", Rows, "Australia Post eParcel", "PCMS manifest",
                    MakeeParcelManifestxml},
     CatalogueEntry{"clsSCMnoSSCC", Label, "any", "label without SSCC", nullptr},
-    CatalogueEntry{"clsStarTrackSpotlightSCM", Label, "StarTrack", "Spotlight", nullptr},
-    CatalogueEntry{"clsStarTrackBigWERSCM", Label, "StarTrack", "BigW", nullptr},
+    CatalogueEntry{"clsStarTrackSpotlightSCM", Label, "StarTrack", "Spotlight", MakeStarTrackSpotlightSCM},
+    CatalogueEntry{"clsStarTrackBigWERSCM", Label, "StarTrack", "BigW", MakeStarTrackBigWERSCM},
     CatalogueEntry{"clsDFESCMWinPCL", Label, "DFE", "drawn label", nullptr},
     CatalogueEntry{"clsDFESCMsscc", Label, "DFE", "SSCC label", nullptr},
     CatalogueEntry{"clsStarTrackManifestcln", Rows, "StarTrack",
@@ -78,12 +94,12 @@ constexpr std::array kCatalogue = {
                    "end-of-day CLN, consolidated manifest, dangerous goods", nullptr},
     CatalogueEntry{"clsIpecDA1250EOD", Rows, "Ipec", "1250 end of day, consolidated manifest",
                    nullptr},
-    CatalogueEntry{"clsTollNZSCM", Label, "Toll", "NZ", nullptr},
+    CatalogueEntry{"clsTollNZSCM", Label, "Toll", "NZ", MakeTollNZSCM},
     CatalogueEntry{"clsAustPostDespatchSCM", Label, "Australia Post", "despatch article-id labels",
                    nullptr},
     CatalogueEntry{"clseParcelManifestEODxml", Rows, "Australia Post eParcel", "PCMS end of day",
                    MakeeParcelManifestEODxml},
-    CatalogueEntry{"clsTollDJsSCM", Label, "Toll", "David Jones", nullptr},
+    CatalogueEntry{"clsTollDJsSCM", Label, "Toll", "David Jones", MakeTollDJsSCM},
 };
 static_assert(kCatalogue.size() == 48);
 

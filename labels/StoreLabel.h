@@ -79,14 +79,17 @@ inline constexpr std::array<BatchField, 31> kStoreLabelBatch = {{
 template <std::size_t Drop, std::size_t N>
 constexpr std::array<BatchField, N - Drop> BatchWithout(const std::array<BatchField, N>& batch,
                                                        const std::array<int, Drop>& numbers) {
-  std::array<BatchField, N - Drop> kept{batch[0]};
-  std::size_t at = 0;
-  for (const BatchField& field : batch) {
-    bool dropped = false;
-    for (int number : numbers) dropped = dropped || field.number == number;
-    if (!dropped) kept[at++] = field;
-  }
-  return kept;
+  const auto kept = [&](std::size_t k) {
+    for (const BatchField& field : batch) {
+      bool dropped = false;
+      for (int number : numbers) dropped = dropped || field.number == number;
+      if (!dropped && k-- == 0) return field;
+    }
+    return batch[0];  // not reached: N - Drop fields are kept
+  };
+  return [&]<std::size_t... I>(std::index_sequence<I...>) {
+    return std::array<BatchField, N - Drop>{{kept(I)...}};
+  }(std::make_index_sequence<N - Drop>());
 }
 
 // What every store label format begins with (a line at row 555 under the

@@ -11,6 +11,11 @@ namespace {
 using V = const LabelValues&;
 bool HasPanel(V v) { return !v.PanelText.empty(); }
 
+// A store's number as the labels print it: four digits.
+std::string StoreNumber(const Ref<host::Receiver>& store) {
+  return Format(host::Read(store, &host::Receiver::StoreCode), "0000");
+}
+
 }  // namespace
 
 const std::array<zpl::Piece, 37> kStoreLabelZpl = {{
@@ -85,8 +90,8 @@ bool ReadStoreLabelValues(Procedure& proc, const Ref<host::Pack>& pack, LabelVal
            v.ForName = UCase(Left(Trim(Read(store, &host::Receiver::Name).Text()), cuts.storeName));
            v.ForLine = UCase(Left(Trim(Read(store, &host::Receiver::AddressLine2).Text()), 15));
            v.ForPostcode = Left(Read(store, &host::Receiver::Postcode).Text(), 4);
+           v.StoreText = StoreNumber(store);
          }) &&
-         ReadStoreNumber(proc, pack, v) &&
          proc([&] { despatch = pack->Despatch(); }) &&
          proc([&] {
            v.ZoneDeptA = Read(despatch, &host::Despatch::ZoneDeptA).Text();
@@ -102,9 +107,7 @@ bool ReadStoreLabelValues(Procedure& proc, const Ref<host::Pack>& pack, LabelVal
 }
 
 bool ReadStoreNumber(Procedure& proc, const Ref<host::Pack>& pack, LabelValues& v) {
-  return proc([&] {
-    v.StoreText = Format(host::Read(pack->ShipTo(), &host::Receiver::StoreCode), "0000");
-  });
+  return proc([&] { v.StoreText = StoreNumber(pack->ShipTo()); });
 }
 
 }  // namespace quendal

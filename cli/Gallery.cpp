@@ -1,5 +1,6 @@
 #include "cli/Gallery.h"
 
+#include <algorithm>
 #include <filesystem>
 #include <map>
 #include <ostream>
@@ -52,16 +53,26 @@ Picture Print(LabelInterface& labels, const Ref<host::System>& system, const Ref
   }
   Picture picture;
   preview::Printer printer({dpi});
-  static const std::regex kHeader("\\{F,([^,|]*),A,R,[A-Z],([0-9]+),([0-9]+),\"([^\"]*)\"");
+  std::string sent;
   for (const MemorySpooler::Job& job : spooler->jobs) {
-    std::smatch header;
-    if (std::regex_search(job.bytes, header, kHeader))
-      picture.format = "\"" + header[4].str() + "\" " + header[1].str() + ", " + header[2].str() +
-                       " x " + header[3].str();
+    sent += job.bytes;
     preview::Result result = printer.Print(job.bytes);
     if (!result.pages.empty()) picture.page = std::move(result.pages.back());
     for (auto& note : result.notes) picture.notes.push_back(std::move(note));
   }
+  // The format the last batch was printed on: the last one stored under its number before it.
+  static const std::regex kBatch("\\{B,([^,|]*),");
+  static const std::regex kFormat("\\{F,([^,|]*),A,R,[A-Z],([0-9]+),([0-9]+),\"([^\"]*)\"");
+  std::string number;
+  std::size_t batchAt = sent.size();
+  for (auto it = std::sregex_iterator(sent.begin(), sent.end(), kBatch); it != std::sregex_iterator(); ++it) {
+    number = (*it)[1].str();
+    batchAt = static_cast<std::size_t>(it->position());
+  }
+  for (auto it = std::sregex_iterator(sent.begin(), sent.begin() + static_cast<std::ptrdiff_t>(batchAt), kFormat);
+       it != std::sregex_iterator(); ++it)
+    if ((*it)[1].str() == number || number.empty())
+      picture.format = "\"" + (*it)[4].str() + "\" " + (*it)[1].str() + ", " + (*it)[2].str() + " x " + (*it)[3].str();
   return picture;
 }
 
@@ -100,28 +111,57 @@ std::string Table(const json& pictures, const fs::path& readme) {
   return table + "</table>\n" + kGalleryEnd;
 }
 
-void WriteTable(const std::string& path, const std::string& table) {
-  const auto text = ReadFile(path);
-  if (!text) throw OpenFailure("cannot read " + path);
-  const std::size_t start = text->find(kGalleryStart);
-  const std::size_t end = start == std::string::npos ? start : text->find(kGalleryEnd, start);
+// Where the gallery block of a Markdown file begins and ends (the end mark's
+// position); UsageError when the file has none.
+std::pair<std::size_t, std::size_t> Block(const std::string& path, const std::string& text) {
+  // The marks stand on lines of their own (a text may quote them).
+  const auto line = [&](std::string_view mark, std::size_t from) {
+    for (std::size_t at = text.find(mark, from); at != std::string::npos; at = text.find(mark, at + 1)) {
+      const std::size_t after = at + mark.size();
+      if ((at == 0 || text[at - 1] == '\n') && (after == text.size() || text[after] == '\n')) return at;
+    }
+    return std::string::npos;
+  };
+  const std::size_t start = line(kGalleryStart, 0);
+  const std::size_t end = start == std::string::npos ? start : line(kGalleryEnd, start);
   if (end == std::string::npos)
     throw UsageError(path + " has no " + kGalleryStart + " ... " + kGalleryEnd + " block for the gallery");
+  return {start, end};
+}
+
+std::string ReadMarkdown(const std::string& path) {
+  const auto text = ReadFile(path);
+  if (!text) throw OpenFailure("cannot read " + path);
+  Block(path, *text);
+  return *text;
+}
+
+void WriteTable(const std::string& path, const std::string& table) {
+  const std::string text = ReadMarkdown(path);
+  const auto [start, end] = Block(path, text);
   const std::string updated =
-      text->substr(0, start) + table + text->substr(end + std::string_view(kGalleryEnd).size());
+      text.substr(0, start) + table + text.substr(end + std::string_view(kGalleryEnd).size());
   if (!ReplaceFile(path, updated)) throw OpenFailure("cannot write " + path);
 }
 
 }  // namespace
 
 int RunGallery(mvserver::SqliteHost& host, const GalleryOptions& options, std::ostream& cout, bool asJson) {
+  // A file that can take no table is refused before anything is drawn.
+  if (!options.readme.empty()) ReadMarkdown(options.readme);
   if (!CreateFolder(options.out)) throw OpenFailure("cannot create " + options.out);
   const auto packs = FirstPacks(host);
   const auto system = host.System();
   json pictures = json::array();
   json skipped = json::array();
-  for (const auto& entry : Catalogue()) {
-    if (entry.family != Family::Label || !entry.factory) continue;
+  // By class name, so that each carrier's classes stand together.
+  std::vector<const CatalogueEntry*> classes;
+  for (const auto& entry : Catalogue())
+    if (entry.family == Family::Label && entry.factory) classes.push_back(&entry);
+  std::sort(classes.begin(), classes.end(),
+            [](const CatalogueEntry* a, const CatalogueEntry* b) { return a->className < b->className; });
+  for (const CatalogueEntry* built : classes) {
+    const CatalogueEntry& entry = *built;
     const auto pack = packs.find(std::string(entry.carrier));
     const auto any = packs.find("any");
     if (pack == packs.end() && any == packs.end()) {

@@ -133,8 +133,12 @@ void ConsignmentWriter::LogLine(long errorNumber, std::string_view procedure,
   if (errorLog_) errorLog_->push_back(LastLogId());
 }
 
+bool IsCarrierFolder(const std::string& folder) {
+  return FolderExists(folder) && folder.back() == kFolderSeparator;
+}
+
 bool ConsignmentWriter::CheckFolder(const std::string& folder) {
-  if (FolderExists(folder) && folder.back() == kFolderSeparator) return true;
+  if (IsCarrierFolder(folder)) return true;
   LogLine(0, "Open carrier message file", "Invalid folder " + folder);
   return false;
 }

@@ -20,6 +20,9 @@ enum class ServiceTable { Ipec1250, Ipec1256, Hunter, TNTET11 };
 // The folder separator that ends every carrier folder text.
 inline constexpr char kFolderSeparator = '/';
 
+// A carrier folder exists and its text ends with the folder separator.
+bool IsCarrierFolder(const std::string& folder);
+
 class ConsignmentWriter : public Lifecycle, public ConsignmentInterface {
  public:
   void Process(const Ref<host::System>& objSystem, const Ref<host::ConNote>& objConNote,
@@ -43,6 +46,9 @@ class ConsignmentWriter : public Lifecycle, public ConsignmentInterface {
   const std::string& AValue() const { return aValue_; }
   const std::string& BValue() const { return bValue_; }
 
+  // A line of a carrier file: code-page text ended by carriage return and line feed.
+  static std::string CarrierLine(std::string_view utf8);
+
  protected:
   explicit ConsignmentWriter(std::string_view className) : Lifecycle(className) {}
 
@@ -63,9 +69,6 @@ class ConsignmentWriter : public Lifecycle, public ConsignmentInterface {
   // The carrier file of the current call.
   AppendingFile& File() { return file_; }
   void CloseOpenFile() override { file_.Close(); }
-
-  // A line of a carrier file: code-page text ended by carriage return and line feed.
-  static std::string CarrierLine(std::string_view utf8);
 
   std::string aValue_;
   std::string bValue_;

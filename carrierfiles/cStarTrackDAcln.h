@@ -8,12 +8,12 @@
 #include <memory>
 #include <string>
 
-#include "carrierfiles/ConsignmentIndex.h"
+#include "carrierfiles/ClnWriter.h"
 #include "carrierfiles/ConsignmentWriter.h"
 
 namespace quendal {
 
-class clsStarTrackDAcln : public ConsignmentWriter {
+class clsStarTrackDAcln : public ConsignmentWriter, private ClnWriter::Owner {
  public:
   clsStarTrackDAcln();
 
@@ -21,21 +21,23 @@ class clsStarTrackDAcln : public ConsignmentWriter {
   bool DGDeclaration();
   // Prints the dangerous goods declaration of the consignment on the
   // System's document printer; false when it could not be printed.
-  bool DangerouseGoodsDeclaration(const Ref<host::ConNote>& aConnote);
+  bool DangerouseGoodsDeclaration(const Ref<host::ConNote>& aConnote) override;
 
   // The duplicate check normally answers from an index of the day's file;
   // switched off it reads the whole file for every consignment.
-  void SetDuplicateIndex(bool enabled) { index_.SetEnabled(enabled); }
+  void SetDuplicateIndex(bool enabled) { cln_.SetDuplicateIndex(enabled); }
 
  protected:
   void Compile(const Ref<host::ConNote>& objConNote, const Ref<host::ASN>& objASN,
                const Ref<host::PackList>& lstPacks) override;
+  void CloseOpenFile() override { cln_.Close(); }
 
  private:
-  std::string TargetFile(const Ref<host::ConNote>& conNote, const Ref<host::ASN>& asn,
-                         const Ref<host::Carrier>& carrier, const std::string& folder);
+  void LogLine(long errorNumber, std::string_view procedure, std::string_view message) override {
+    ConsignmentWriter::LogLine(errorNumber, procedure, message);
+  }
 
-  ConsignmentIndex index_{"10", 20};
+  ClnWriter cln_;
 };
 
 std::unique_ptr<Component> MakeStarTrackDAcln();

@@ -8,6 +8,7 @@
 #include "cli/DemoData.h"
 #include "cli/Work.h"
 #include "frame/Catalogue.h"
+#include "frame/VB.h"
 #include "labels/LabelPrinter.h"
 #include "labels/Preview.h"
 #include "mvserver/SqliteHost.h"
@@ -74,6 +75,7 @@ void PrepareFolder(const fs::path& root) {
     for (const char* suffix : {"", "-journal", "-wal", "-shm"}) fs::remove(root / (std::string(kDatabase) + suffix), ec);
     fs::remove_all(root / "spool", ec);
     fs::remove_all(root / "carriers", ec);
+    fs::remove_all(root / "reports", ec);
   }
   std::ofstream(root / kMarker) << "Made by quendal demo; the next demo run replaces this folder's outputs.\n";
 }
@@ -235,6 +237,17 @@ int RunDemo(const std::string& out, std::ostream& cout, bool asJson) {
           for (const auto& [row, result] : rowRun.processed) processed.push_back({{"row", row}, {"result", result}});
           run["runs"].push_back({{"ediDocument", c.ediDocumentId}, {"init", rowRun.init}, {"loaded", rowRun.loaded},
                                  {"processed", processed}, {"term", rowRun.term}, {"vtErrorLog", rowRun.vtErrorLog}});
+          // The summary Term printed, once more kept as a PDF with its HTML copy for viewing.
+          if (auto* summary = as<ConsolidatedManifestInterface>(created.object)) {
+            const std::string today = Format(Var(Today()), "Short Date");
+            const fs::path html = root / "reports" / (std::string(entry.className) + ".html");
+            fs::create_directories(html.parent_path());
+            const std::int16_t result = summary->ConsolidatedManifestPrint(
+                today, today, host->Find<host::Vendor>("Vendor", 1)->VendorCode().Text(),
+                host->Find<host::Carrier>("Carrier", c.carrierId)->CarrierCode().Text(), 0, html.string());
+            run["summary"] = {{"result", result}, {"kept", summary->ConsolidatedManifestFile()},
+                              {"html", result == 0 ? html.string() : std::string()}};
+          }
         }
       }
     } catch (const std::exception& e) {
@@ -323,6 +336,28 @@ int RunDemo(const std::string& out, std::ostream& cout, bool asJson) {
                     std::to_string(run["log"].size()), wrote});
   }
   PrintTable(cout, {"Class", "Family", "Carrier", "Run", "Log", "Wrote"}, rows);
+  // Where each consignment summary went: the job Term printed, and the copy kept for viewing.
+  bool heading = false;
+  for (const auto& run : runs) {
+    if (!run.contains("summary")) continue;
+    if (!heading) cout << "\nConsignment Summary Print:\n";
+    heading = true;
+    std::string printed;
+    for (const auto& file : run["files"]) {
+      const std::string path = file["path"];
+      if (path.starts_with("spool/") && path.find("Consignment Summary Print") != std::string::npos)
+        printed = path;
+    }
+    const json& summary = run["summary"];
+    cout << "  " << run["class"].get<std::string>() << ": "
+         << (printed.empty() ? std::string("nothing printed at Term") : "printed at Term as " + printed);
+    if (!summary["kept"].get<std::string>().empty())
+      cout << "; kept as " << fs::relative(summary["kept"].get<std::string>(), root).string() << " and "
+           << fs::relative(summary["html"].get<std::string>(), root).string();
+    else
+      cout << "; ConsolidatedManifestPrint returned " << summary["result"];
+    cout << "\n";
+  }
   cout << "\nLog entries:\n";
   PrintLogs(cout, host->LogsSince(0));
   return 0;

@@ -1,5 +1,6 @@
 #include "cli/Work.h"
 
+#include <algorithm>
 #include <ostream>
 
 namespace quendal::cli {
@@ -24,7 +25,7 @@ LogList Despatch(ConsignmentInterface& consignment, const Ref<host::System>& sys
 }
 
 RowRun RunRows(RowInterface& rows, const Ref<host::System>& system, std::int16_t ediDocId,
-               const std::optional<std::vector<std::int32_t>>& chosen) {
+               const std::optional<std::vector<std::int32_t>>& chosen, const Progress& progress) {
   RowRun run;
   run.init = rows.Init(system, ediDocId, run.columns);
   run.loaded = rows.Load({}, run.rows);
@@ -38,9 +39,21 @@ RowRun RunRows(RowInterface& rows, const Ref<host::System>& system, std::int16_t
   } else {
     for (std::size_t i = 0; i < run.rows.Rows(); ++i) which.push_back(static_cast<std::int32_t>(i));
   }
-  for (auto row : which) run.processed.emplace_back(row, rows.Process(row, run.vtErrorLog));
+  for (auto row : which) {
+    run.processed.emplace_back(row, rows.Process(row, run.vtErrorLog));
+    if (progress) progress(run.processed.size(), which.size());
+  }
   run.term = rows.Term();
   return run;
+}
+
+Progress TerminalProgress(std::ostream& out) {
+  return [&out](std::size_t done, std::size_t total) {
+    const std::size_t step = std::max<std::size_t>(total / 100, 1);
+    if (done % step != 0 && done != total) return;
+    out << "\rProcess: " << done << " of " << total << " rows" << (done == total ? "\n" : "")
+        << std::flush;
+  };
 }
 
 json GridJson(const Grid& grid) {

@@ -3,6 +3,7 @@
 #pragma once
 
 #include <cstdint>
+#include <functional>
 #include <optional>
 #include <string>
 #include <vector>
@@ -36,10 +37,18 @@ struct RowRun {
   LogList vtErrorLog;
 };
 
+// Rows done of the rows to do, after each Process.
+using Progress = std::function<void(std::size_t done, std::size_t total)>;
+
 // Init, Load, Process of the chosen rows (0-based; all when none are given), Term.
 // UsageError for a row the load did not return (before any row is processed).
 RowRun RunRows(RowInterface& rows, const Ref<host::System>& system, std::int16_t ediDocId,
-               const std::optional<std::vector<std::int32_t>>& chosen);
+               const std::optional<std::vector<std::int32_t>>& chosen,
+               const Progress& progress = {});
+
+// Shows a run's progress on a terminal: "rows done of rows" on one line
+// that is rewritten in place, about a hundred times a run.
+Progress TerminalProgress(std::ostream& out);
 
 json GridJson(const Grid& grid);
 void PrintGrid(std::ostream& out, const Grid& columns, const Grid& rows);

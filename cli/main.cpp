@@ -48,6 +48,12 @@ struct Options {
   std::int16_t ediDoc = 0;
   std::string rows = "all";
   std::string out = "./quendal-demo";
+  std::string from;
+  std::string to;
+  std::string vendor;
+  std::string carrier;
+  std::string html;
+  std::int16_t reportOption = 1;
 
   std::string message;
   std::int64_t job = 0;
@@ -59,6 +65,9 @@ struct Options {
   int dpi = 0;
   GalleryOptions gallery;
 };
+
+// A run shows its progress on a terminal once it has more rows than this.
+constexpr std::size_t kProgressRows = 200;
 
 // What System.LastError tells after PackLineValid.
 std::string PackLineMeaning(int code) {
@@ -388,7 +397,14 @@ class Command {
     const std::int64_t lastLog = Host().LastLogId();
     RowInterface* rows = nullptr;
     auto object = Create(entry, rows);
-    const RowRun run = RunRows(*rows, System(), o_.ediDoc, chosen);
+    // Progress goes to a person watching a long run, never into output a program reads.
+    Progress progress;
+    if (!o_.json && isatty(STDERR_FILENO)) {
+      progress = [show = TerminalProgress(std::cerr)](std::size_t done, std::size_t total) {
+        if (total > kProgressRows) show(done, total);
+      };
+    }
+    const RowRun run = RunRows(*rows, System(), o_.ediDoc, chosen, progress);
     const auto logs = Host().LogsSince(lastLog);
     json processed = json::array();
     for (const auto& [row, result] : run.processed) processed.push_back({{"row", row}, {"result", result}});
@@ -404,6 +420,56 @@ class Command {
            std::cout << "Term: " << (run.term ? "True" : "False") << "\n";
            PrintLogs(std::cout, logs);
          });
+    return 0;
+  }
+
+  // A date as the host takes it; UsageError for anything else.
+  std::string DateArgument(const std::string& option, const std::string& text) {
+    try {
+      Var(text).Date();
+    } catch (const std::exception&) {
+      throw UsageError(option + " takes a date, YYYY-MM-DD or dd/mm/yyyy, not \"" + text + "\"");
+    }
+    return text;
+  }
+
+  int Report() {
+    const CatalogueEntry& entry = BuiltClass(o_.className, Family::Rows);
+    const std::string from = DateArgument("--from", o_.from);
+    const std::string to = DateArgument("--to", o_.to);
+    if (o_.ediDoc != 0 && !Host().Find("EDIDocument", o_.ediDoc))
+      throw UsageError("no EDI document " + std::to_string(o_.ediDoc) + " in " + o_.db);
+    const std::int64_t lastLog = Host().LastLogId();
+    RowInterface* rows = nullptr;
+    auto object = Create(entry, rows);
+    auto* summary = as<ConsolidatedManifestInterface>(object);
+    if (!summary) throw UsageError(entry.Identifier() + " does not print the consolidated manifest");
+    // Init gives the class the System (and, with an EDI document, its run's records).
+    Grid columns;
+    rows->Init(System(), o_.ediDoc, columns);
+    const std::int16_t result =
+        summary->ConsolidatedManifestPrint(from, to, o_.vendor, o_.carrier, o_.reportOption, o_.html);
+    const std::string kept = summary->ConsolidatedManifestFile();
+    const std::string printer = Host().System()->DocumentPrinter().Text();
+    const auto logs = Host().LogsSince(lastLog);
+    static constexpr const char* kMeaning[] = {"produced", "the host gave no consignment list",
+                                               "no consignments", "not produced"};
+    const std::string meaning = result >= 0 && result <= 3 ? kMeaning[result] : "unknown";
+    json out = {{"class", entry.Identifier()}, {"from", from}, {"to", to}, {"vendor", o_.vendor},
+                {"carrier", o_.carrier}, {"option", o_.reportOption}, {"result", result},
+                {"meaning", meaning}, {"log", LogsJson(logs)}};
+    if (!kept.empty()) out["kept"] = kept;
+    if (result == 0 && kept.empty()) out["printer"] = printer;
+    if (!o_.html.empty() && result == 0) out["html"] = o_.html;
+    Emit(out, [&] {
+      std::cout << entry.Identifier() << " ConsolidatedManifestPrint(" << from << ", " << to << ", "
+                << o_.vendor << ", " << o_.carrier << ", " << o_.reportOption << "): " << result
+                << " (" << meaning << ")\n";
+      if (!kept.empty()) std::cout << "Consignment Summary Print kept in " << kept << "\n";
+      if (result == 0 && kept.empty()) std::cout << "Consignment Summary Print sent to printer " << printer << "\n";
+      if (!o_.html.empty() && result == 0) std::cout << "HTML copy in " << o_.html << "\n";
+      PrintLogs(std::cout, logs);
+    });
     return 0;
   }
 
@@ -496,6 +562,29 @@ int Main(int argc, char** argv) {
   manifest->add_option("CLASS", o.className, "row class")->required();
   manifest->add_option("--edi-doc", o.ediDoc, "EDI document id")->required();
   manifest->add_option("--rows", o.rows, "all, or row numbers from 0: N,N,...")->capture_default_str();
+  manifest->footer("On a terminal, a run of more than " + std::to_string(kProgressRows) +
+                   " rows shows its progress (rows done of rows) on stderr; with --json or "
+                   "without a terminal it shows none.");
+
+  auto* report = app.add_subcommand(
+      "report", "ConsolidatedManifestPrint: the consignment summary of a vendor and carrier's days");
+  report->footer(
+      "Prints the \"Consignment Summary Print\" of the consignments dated FROM to TO (both "
+      "included). A class that sums up its own manifest has nothing to list here (result 2): its "
+      "summary comes with `quendal manifest`. Results: 0 produced, 1 the host gave no consignment "
+      "list, 2 no consignments, 3 not produced.");
+  report->add_option("--class", o.className, "row class that prints the summary")->required();
+  report->add_option("--from", o.from, "first day: YYYY-MM-DD or dd/mm/yyyy")->required();
+  report->add_option("--to", o.to, "last day, included")->required();
+  report->add_option("--vendor", o.vendor, "vendor code (or id)")->required();
+  report->add_option("--carrier", o.carrier, "carrier code (or id)")->required();
+  report->add_option("--html", o.html, "also write the summary as HTML to this file");
+  report
+      ->add_option("--option", o.reportOption,
+                   "1 prints on the System's document printer; 0 or 2 keep the PDF and say where")
+      ->check(CLI::Range(0, 32767))
+      ->capture_default_str();
+  report->add_option("--edi-doc", o.ediDoc, "EDI document to Init the class with (default: none)");
 
   auto* demo = app.add_subcommand("demo", "a demo day in a fresh database, running every built class");
   demo->add_option("--out", o.out, "demo folder")->capture_default_str();
@@ -554,6 +643,7 @@ int Main(int argc, char** argv) {
     if (*gallery) return command.Gallery();
     if (*despatch) return command.Despatch();
     if (*manifest) return command.Manifest();
+    if (*report) return command.Report();
     if (*demo) return RunDemo(o.out, std::cout, o.json);
   } catch (const UsageError& e) {
     std::cerr << "quendal: " << e.what() << "\n";

@@ -27,6 +27,8 @@ std::unique_ptr<Component> MakeStarTrackRebelSCM();
 std::unique_ptr<Component> MakeeParcelManifestxml();
 std::unique_ptr<Component> MakeeParcelManifestEODxml();
 std::unique_ptr<Component> MakeStarTrackDAcln();
+std::unique_ptr<Component> MakeStarTrackManifestcln();
+std::unique_ptr<Component> MakeStarTrackEODcln();
 std::unique_ptr<Component> MakeTNTDAet11();
 std::unique_ptr<Component> MakeVicExpressDAcln();
 std::unique_ptr<Component> MakeAlliedExpressSEDIP();
@@ -85,13 +87,13 @@ constexpr std::array kCatalogue = {
     CatalogueEntry{"clsDFESCMWinPCL", Label, "DFE", "drawn label", nullptr},
     CatalogueEntry{"clsDFESCMsscc", Label, "DFE", "SSCC label", nullptr},
     CatalogueEntry{"clsStarTrackManifestcln", Rows, "StarTrack",
-                   "manifest CLN, consolidated manifest, dangerous goods", nullptr},
+                   "manifest CLN, consolidated manifest, dangerous goods", MakeStarTrackManifestcln},
     CatalogueEntry{"clsDFEDAManifestxml", Rows, "DFE",
                    "manifest XML, consolidated manifest, dangerous goods", nullptr},
     CatalogueEntry{"clsIpecDA1250Manifest", Rows, "Ipec", "1250 manifest, consolidated manifest",
                    nullptr},
     CatalogueEntry{"clsStarTrackEODcln", Rows, "StarTrack",
-                   "end-of-day CLN, consolidated manifest, dangerous goods", nullptr},
+                   "end-of-day CLN, consolidated manifest, dangerous goods", MakeStarTrackEODcln},
     CatalogueEntry{"clsIpecDA1250EOD", Rows, "Ipec", "1250 end of day, consolidated manifest",
                    nullptr},
     CatalogueEntry{"clsTollNZSCM", Label, "Toll", "NZ", MakeTollNZSCM},

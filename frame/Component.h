@@ -171,4 +171,30 @@ class RowInterface : public virtual Component, public virtual LifecycleInterface
   virtual std::int32_t Process(std::int32_t a_lRowNum, LogList& vtErrorLog) = 0;
 };
 
+// The consolidated manifest ("Consignment Summary Print") that the driver
+// signs at pickup, offered by the manifest and end-of-day classes that print it.
+class ConsolidatedManifestInterface : public virtual Component {
+ public:
+  // Results of ConsolidatedManifestPrint.
+  static constexpr std::int16_t kProduced = 0;
+  static constexpr std::int16_t kNoList = 1;      // the host gave no consignment list
+  static constexpr std::int16_t kEmptyList = 2;   // the list holds no consignment
+  static constexpr std::int16_t kNotProduced = 3; // the document could not be printed or kept
+
+  // Prints the summary of the class's consignments: those of its own
+  // manifest, or those dated aBeginDate to aEndDate (inclusive) of the
+  // vendor and carrier codes. aReportOption 1 prints straight to the
+  // System's document printer; 0 and 2 keep the document for the user to
+  // see (ConsolidatedManifestFile). A non-empty aHTMLFileName also gets an
+  // HTML copy.
+  virtual std::int16_t ConsolidatedManifestPrint(const std::string& aBeginDate,
+                                                 const std::string& aEndDate,
+                                                 const std::string& aVendorId,
+                                                 const std::string& aCarrierId,
+                                                 std::int16_t aReportOption,
+                                                 const std::string& aHTMLFileName) = 0;
+  // Where the last summary kept for the user to see was written (a PDF); empty when none.
+  virtual std::string ConsolidatedManifestFile() const = 0;
+};
+
 }  // namespace quendal

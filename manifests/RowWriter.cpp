@@ -1,5 +1,6 @@
 #include "manifests/RowWriter.h"
 
+#include <cstdint>
 #include <unordered_set>
 
 #include "platform/Clock.h"
@@ -158,6 +159,11 @@ Ref<host::ConNotes> RowWriter::TodaysConNotes() {
   const DateTime today = Today();
   return system_->GetConNotesByDate(Var(today), Var(today.AddDays(1)), ediDocument_->VendorId(),
                                     ediDocument_->CarrierId());
+}
+
+std::int32_t RowWriter::ConNoteIdResult(const Ref<host::ConNote>& conNote) {
+  const double id = conNote->ConNoteId().NumberOr(0);
+  return id >= INT32_MIN && id <= INT32_MAX ? static_cast<std::int32_t>(id) : 0;
 }
 
 bool RowWriter::SaveManifestRecord() {

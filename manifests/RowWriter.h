@@ -10,6 +10,7 @@
 // it does per row and at the end; the frame does the rest once for all.
 #pragma once
 
+#include <array>
 #include <cstddef>
 #include <cstdint>
 #include <span>
@@ -27,6 +28,16 @@ struct GridColumn {
   int alignment;
   int width;
 };
+
+// The grid most runs show: number, partner, delivery location, order and
+// the row's result.
+inline constexpr std::array<GridColumn, 5> kConsignmentColumns = {{
+    {"ConNote No", 0, 1500},
+    {"Partner", 2, 1000},
+    {"Delivery Locn", 0, 2000},
+    {"Order No", 0, 2600},
+    {"Result", 0, 3000},
+}};
 
 class RowWriter : public virtual RowInterface, public Lifecycle {
  public:
@@ -62,6 +73,10 @@ class RowWriter : public virtual RowInterface, public Lifecycle {
   bool SaveManifestRecord();
 
   std::size_t RowCount() const { return conNotes_.size(); }
+
+  // The consignment's id as a row's result; 0 when the 32-bit result
+  // cannot hold it, as that is no id the host could look up.
+  static std::int32_t ConNoteIdResult(const Ref<host::ConNote>& conNote);
 
   Ref<host::EDIDocument> ediDocument_;
   Ref<host::Vendor> vendor_;

@@ -13,13 +13,6 @@ namespace quendal {
 
 namespace {
 
-constexpr std::array<GridColumn, 5> kColumns = {{
-    {"ConNote No", 0, 1500},
-    {"Partner", 2, 1000},
-    {"Delivery Locn", 0, 2000},
-    {"Order No", 0, 2600},
-    {"Result", 0, 3000},
-}};
 constexpr std::size_t kRowColumns = 6;
 
 void AppendContentsItem(pugi::xml_node parent) {
@@ -65,7 +58,7 @@ const eParcelRows::ConsignmentField eParcelRows::kConsignmentFields[] = {
 };
 
 eParcelRows::eParcelRows(const eParcelVariant& variant)
-    : RowWriter(variant.className, kColumns, kRowColumns), variant_(variant) {}
+    : RowWriter(variant.className, kConsignmentColumns, kRowColumns), variant_(variant) {}
 
 Ref<host::ConNotes> eParcelRows::QueryConNotes() {
   return variant_.awaitingManifest ? ManifestConNotes() : TodaysConNotes();
@@ -145,9 +138,7 @@ std::int32_t eParcelRows::ProcessRow(Procedure& proc, const Ref<host::ConNote>& 
     return result;
   if (!proc([&] {
         vtErrorLog = {LastLogId()};
-        const double id = conNote->ConNoteId().NumberOr(0);
-        // An id the 32-bit result cannot hold is no id the host could look up.
-        if (id >= INT32_MIN && id <= INT32_MAX) result = static_cast<std::int32_t>(id);
+        result = ConNoteIdResult(conNote);
       }))
     return result;
   return result;

@@ -954,6 +954,19 @@ std::shared_ptr<SqliteHost> SqliteHost::Open(const std::string& path) {
 
 namespace {
 
+// The records the library adds one at a time (log entries, manifests) take
+// the next ordinal of their table: an index keeps finding it from growing
+// with the table. Also made on opening a database written without it.
+constexpr std::array<std::string_view, 2> kAddedTables = {"Logs", "Manifests"};
+
+std::string OrdinalIndexesSql() {
+  std::string sql;
+  for (std::string_view table : kAddedTables)
+    sql += "CREATE INDEX IF NOT EXISTS " + Quoted("idx_" + std::string(table) + "_Ordinal") + " ON " +
+           Quoted(table) + " (Ordinal);\n";
+  return sql;
+}
+
 std::string CreateSchemaSql(const Model& model) {
   std::string sql, indexes;
   std::set<std::string> indexed;
@@ -999,6 +1012,7 @@ std::string CreateSchemaSql(const Model& model) {
     }
   }
   sql += indexes;
+  sql += OrdinalIndexesSql();
   // The one System record always exists, so that its settable members write through.
   sql += "INSERT INTO System (RowId, Ordinal) VALUES (1, 0);\n";
   sql += "PRAGMA user_version = " + std::to_string(kSchemaVersion) + ";\n";
@@ -1029,6 +1043,7 @@ void SqliteHost::CreateOrCheckSchema() {
     throw OpenError(db_.Path() + " was written by a newer Quendal (schema version " +
                     std::to_string(version) + "; this one knows up to " +
                     std::to_string(kSchemaVersion) + ")");
+  db_.Exec(OrdinalIndexesSql());
 }
 
 namespace {

@@ -7,6 +7,9 @@
 
 #include <algorithm>
 #include <filesystem>
+#include <map>
+#include <unordered_map>
+#include <tuple>
 
 #include "platform/DirectorySpooler.h"
 #include "platform/FileSystem.h"
@@ -83,6 +86,7 @@ struct CairoPrintDocument::Impl {
   cairo_surface_t* surface = nullptr;
   cairo_t* cr = nullptr;
   PangoContext* context = nullptr;
+  std::map<std::tuple<std::string, double, bool>, PangoFontDescription*> fonts;
   int pages = 0;
   double y = 0;
   std::string html;
@@ -95,6 +99,9 @@ struct CairoPrintDocument::Impl {
   bool Open() const { return cr != nullptr; }
 
   void Close() {
+    ClearCellCache();
+    for (auto& [key, description] : fonts) pango_font_description_free(description);
+    fonts.clear();
     if (context) g_object_unref(context);
     if (cr) cairo_destroy(cr);
     if (surface) {
@@ -112,20 +119,28 @@ struct CairoPrintDocument::Impl {
     y = kMarginTop;
   }
 
-  // Starts a new page when `height` does not fit below the current position
-  // (unless the page is still empty).
+  // Whether `height` fits below the current position; anything fits on an empty page.
+  bool Fits(double height) const { return y + height <= Bottom() || y <= kMarginTop; }
+  // Starts a new page when `height` does not fit below the current position.
   void Room(double height) {
-    if (y + height > Bottom() && y > kMarginTop) NewPage();
+    if (!Fits(height)) NewPage();
+  }
+
+  // The description of a font, made once per document.
+  const PangoFontDescription* Font(const std::string& font, double points, bool bold) {
+    auto& description = fonts[{font, points, bold}];
+    if (!description) {
+      description = pango_font_description_from_string(font.c_str());
+      pango_font_description_set_absolute_size(description, points * kTwipsPerPoint * PANGO_SCALE);
+      if (bold) pango_font_description_set_weight(description, PANGO_WEIGHT_BOLD);
+    }
+    return description;
   }
 
   PangoLayout* Layout(const std::string& text, const std::string& font, double points,
                       double width, PangoAlignment align, bool bold = false) {
     PangoLayout* layout = pango_layout_new(context);
-    PangoFontDescription* description = pango_font_description_from_string(font.c_str());
-    pango_font_description_set_absolute_size(description, points * kTwipsPerPoint * PANGO_SCALE);
-    if (bold) pango_font_description_set_weight(description, PANGO_WEIGHT_BOLD);
-    pango_layout_set_font_description(layout, description);
-    pango_font_description_free(description);
+    pango_layout_set_font_description(layout, Font(font, points, bold));
     pango_layout_set_width(layout, static_cast<int>(std::max(width, 1.0) * PANGO_SCALE));
     pango_layout_set_wrap(layout, PANGO_WRAP_WORD_CHAR);
     pango_layout_set_alignment(layout, align);
@@ -166,38 +181,108 @@ struct CairoPrintDocument::Impl {
     pango_layout_iter_free(iter);
   }
 
-  void Row(const std::vector<TableColumn>& columns, const TableRow& cells,
-           std::optional<Colour> shade, bool header) {
-    std::vector<PangoLayout*> layouts;
+  // A table row laid out for the columns: one layout per cell and the row's height.
+  struct RowLayout {
+    std::vector<PangoLayout*> cells;
+    double height = 0;
+    RowLayout() = default;
+    RowLayout(const RowLayout&) = delete;
+    RowLayout& operator=(const RowLayout&) = delete;
+    ~RowLayout() {
+      for (PangoLayout* cell : cells) g_object_unref(cell);
+    }
+  };
+
+  // Cell texts of the table being drawn, laid out once per column and text:
+  // a value that comes back in a column (a town, a count) is not shaped
+  // again. A column whose values keep changing starts afresh now and then,
+  // so the cache stays small.
+  static constexpr std::size_t kCachedCells = 512;
+  std::vector<std::unordered_map<std::string, PangoLayout*>> cellCache;
+
+  void ClearCellCache() {
+    for (auto& column : cellCache)
+      for (auto& [text, layout] : column) g_object_unref(layout);
+    cellCache.clear();
+  }
+
+  void Measure(const std::vector<TableColumn>& columns, const TableRow& cells, RowLayout& row) {
+    if (cellCache.size() < columns.size()) cellCache.resize(columns.size());
     double height = 0;
     for (std::size_t i = 0; i < columns.size(); ++i) {
-      const std::string text = i < cells.size() ? cells[i] : std::string();
-      PangoLayout* layout = Layout(
-          text, "Arial", fontPoints, columns[i].width - 2 * kCellPadding,
-          columns[i].align == TableColumn::Align::Centre ? PANGO_ALIGN_CENTER : PANGO_ALIGN_LEFT);
+      static const std::string kEmpty;
+      const std::string& text = i < cells.size() ? cells[i] : kEmpty;
+      auto& cache = cellCache[i];
+      PangoLayout* layout = nullptr;
+      if (auto hit = cache.find(text); hit != cache.end()) {
+        layout = hit->second;
+      } else {
+        if (cache.size() >= kCachedCells) {
+          for (auto& [cached, old] : cache) g_object_unref(old);
+          cache.clear();
+        }
+        layout = Layout(text, "Arial", fontPoints, columns[i].width - 2 * kCellPadding,
+                        columns[i].align == TableColumn::Align::Centre ? PANGO_ALIGN_CENTER
+                                                                       : PANGO_ALIGN_LEFT);
+        cache.emplace(text, layout);
+      }
+      g_object_ref(layout);
       height = std::max(height, Height(layout));
-      layouts.push_back(layout);
+      row.cells.push_back(layout);
     }
-    height += 2 * kCellPadding;
-    Room(height);
+    row.height = height + 2 * kCellPadding;
+  }
+
+  // Draws a measured row's shade and texts at the current position, which
+  // it moves below the row. The lines come with the table's grid.
+  void Draw(const std::vector<TableColumn>& columns, const RowLayout& row,
+            std::optional<Colour> shade) {
+    if (shade) {
+      double width = 0;
+      for (const TableColumn& column : columns) width += column.width;
+      SetColour(cr, *shade);
+      cairo_rectangle(cr, kMarginLeft, y, width, row.height);
+      cairo_fill(cr);
+    }
+    cairo_set_source_rgb(cr, 0, 0, 0);
     double x = kMarginLeft;
     for (std::size_t i = 0; i < columns.size(); ++i) {
-      const double width = columns[i].width;
-      cairo_rectangle(cr, x, y, width, height);
-      if (shade) {
-        SetColour(cr, *shade);
-        cairo_fill_preserve(cr);
-      }
-      cairo_set_source_rgb(cr, 0, 0, 0);
-      cairo_set_line_width(cr, kLineWidth);
-      cairo_stroke(cr);
       cairo_move_to(cr, x + kCellPadding, y + kCellPadding);
-      pango_cairo_show_layout(cr, layouts[i]);
-      g_object_unref(layouts[i]);
-      x += width;
+      pango_cairo_show_layout(cr, row.cells[i]);
+      x += columns[i].width;
     }
-    y += height;
+    y += row.height;
+  }
 
+  // The lines of the part of a table on one page, stroked as one path: a
+  // rule at `top` and below each row, and the column edges from top to the
+  // last rule.
+  void Grid(const std::vector<TableColumn>& columns, double top, const std::vector<double>& rules) {
+    if (rules.empty()) return;
+    double right = kMarginLeft;
+    for (const TableColumn& column : columns) right += column.width;
+    cairo_new_path(cr);
+    cairo_move_to(cr, kMarginLeft, top);
+    cairo_line_to(cr, right, top);
+    for (double rule : rules) {
+      cairo_move_to(cr, kMarginLeft, rule);
+      cairo_line_to(cr, right, rule);
+    }
+    double x = kMarginLeft;
+    for (std::size_t i = 0; i <= columns.size(); ++i) {
+      cairo_move_to(cr, x, top);
+      cairo_line_to(cr, x, rules.back());
+      if (i < columns.size()) x += columns[i].width;
+    }
+    cairo_set_source_rgb(cr, 0, 0, 0);
+    cairo_set_line_width(cr, kLineWidth);
+    cairo_set_line_cap(cr, CAIRO_LINE_CAP_SQUARE);
+    cairo_stroke(cr);
+    cairo_set_line_cap(cr, CAIRO_LINE_CAP_BUTT);
+  }
+
+  void HtmlRow(const std::vector<TableColumn>& columns, const TableRow& cells,
+               std::optional<Colour> shade, bool header) {
     html += "<tr>";
     for (std::size_t i = 0; i < columns.size(); ++i) {
       const char* tag = header ? "th" : "td";
@@ -298,8 +383,44 @@ void CairoPrintDocument::AddTable(std::string_view format, const TableRow& heade
   const std::vector<TableColumn> columns = ParseTableFormat(format);
   if (columns.empty()) return;
   d.html += "<table style=\"border-collapse:collapse\" border=\"1\">\n";
-  if (!header.empty()) d.Row(columns, header, headerShade, true);
-  for (const TableRow& row : body) d.Row(columns, row, std::nullopt, false);
+  // The header row stays with the first body row, and stands again at the
+  // top of every page the table runs on to.
+  Impl::RowLayout headerRow;
+  if (!header.empty()) {
+    d.Measure(columns, header, headerRow);
+    d.HtmlRow(columns, header, headerShade, true);
+  }
+  double keep = headerRow.height;
+  if (!body.empty()) {
+    Impl::RowLayout first;
+    d.Measure(columns, body.front(), first);
+    keep += first.height;
+  }
+  d.Room(keep);
+  double top = d.y;
+  std::vector<double> rules;  // below each row of the table's part on this page
+  auto startPart = [&] {
+    top = d.y;
+    rules.clear();
+    if (header.empty()) return;
+    d.Draw(columns, headerRow, headerShade);
+    rules.push_back(d.y);
+  };
+  startPart();
+  for (const TableRow& cells : body) {
+    Impl::RowLayout row;
+    d.Measure(columns, cells, row);
+    if (!d.Fits(row.height)) {
+      d.Grid(columns, top, rules);
+      d.NewPage();
+      startPart();
+    }
+    d.Draw(columns, row, std::nullopt);
+    rules.push_back(d.y);
+    d.HtmlRow(columns, cells, std::nullopt, false);
+  }
+  d.Grid(columns, top, rules);
+  d.ClearCellCache();
   d.html += "</table>\n";
 }
 

@@ -9,6 +9,7 @@
 #include "platform/DirectorySpooler.h"
 #include "platform/FileSystem.h"
 #include "tests/support/MemoryHost.h"
+#include "tests/support/Records.h"
 #include "tests/support/TempFolder.h"
 
 namespace quendal {
@@ -19,13 +20,8 @@ using test::MemoryHost;
 using test::MemoryObject;
 using ::testing::ElementsAre;
 using ::testing::HasSubstr;
-
-std::string Pad(std::string_view text, std::size_t width) {
-  std::string out(text);
-  if (out.size() < width) out.append(width - out.size(), ' ');
-  return out;
-}
-std::string Sp(std::size_t n) { return std::string(n, ' '); }
+using test::Pad;
+using test::Sp;
 
 constexpr std::string_view kNo = "SRXZ00012345";
 const std::string kNo20 = Pad(kNo, 20);

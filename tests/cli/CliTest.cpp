@@ -2,10 +2,12 @@
 // status, its one-line errors and its JSON output.
 #include <gtest/gtest.h>
 #include <sys/wait.h>
+#include <unistd.h>
 
 #include <algorithm>
 #include <chrono>
 #include <thread>
+#include <cstdio>
 #include <cstdlib>
 #include <set>
 #include <filesystem>
@@ -331,6 +333,99 @@ TEST_F(CliTest, DemoBuildsADayRunsWhatIsBuiltAndReplacesItsOwnFolderOnly) {
   ASSERT_EQ(Run({"import", Example()}).status, 0);
   ExpectOneLineError(Run({"demo", "--out", "."}), 1, "the demo did not make");
   EXPECT_TRUE(std::filesystem::exists(folder / "quendal.db"));
+}
+
+TEST_F(CliTest, ReportPrintsOrKeepsTheConsignmentSummary) {
+  ASSERT_EQ(Run({"import", Example()}).status, 0);
+  std::filesystem::create_directories(folder / "spool/Despatch Office Laser");
+  // The day's summary of a vendor and carrier, with further options.
+  auto day = [](std::string from, std::string vendor, std::initializer_list<std::string> more) {
+    std::vector<std::string> args = {"--json", "report", "--class", "clsStarTrackEODcln", "--from", from,
+                                     "--to", "14/03/2024", "--vendor", vendor, "--carrier", "SRX"};
+    args.insert(args.end(), more);
+    return args;
+  };
+  const Result printed = Run(day("2024-03-14", "ACME", {}));
+  ASSERT_EQ(printed.status, 0) << printed.err;
+  EXPECT_EQ(printed.Json()["result"], 0);
+  EXPECT_EQ(printed.Json()["printer"], "Despatch Office Laser");
+  int jobs = 0;
+  for (const auto& job : std::filesystem::directory_iterator(folder / "spool/Despatch Office Laser"))
+    jobs += job.path().filename().string().ends_with("Consignment Summary Print.pdf");
+  EXPECT_EQ(jobs, 1);
+
+  const Result kept = Run(day("2024-03-14", "ACME", {"--option", "0", "--html", "summary.html"}));
+  ASSERT_EQ(kept.status, 0) << kept.err;
+  EXPECT_EQ(kept.Json()["kept"], "summary.pdf");
+  EXPECT_TRUE(std::filesystem::exists(folder / "summary.pdf"));
+  EXPECT_NE(test::ReadText(folder / "summary.html").find("SRX00012345"), std::string::npos);
+
+  const Result none = Run(day("2024-03-14", "NOBODY", {}));
+  EXPECT_EQ(none.Json()["result"], 1);  // the host knows no such vendor: no list
+  ExpectOneLineError(Run(day("14.03.2024", "ACME", {})), 1, "--from takes a date");
+  ExpectOneLineError(Run({"report", "--class", "clseParcelManifestxml", "--from", "2024-03-14", "--to",
+                          "2024-03-14", "--vendor", "ACME", "--carrier", "SRX"}),
+                     1, "does not print the consolidated manifest");
+}
+
+TEST_F(CliTest, ALongManifestRunShowsItsProgressOnATerminalOnly) {
+  // A StarTrack carrier with 250 consignments awaiting a manifest.
+  json day = {{"System", {{"DocumentPrinter", "Office"}}},
+              {"Vendors", {{{"VendorId", 1}, {"VendorCode", "ACME"}}}},
+              {"Carriers", {{{"CarrierId", 1}, {"CarrierCode", "SRX"}, {"AccountRef", "SRX"},
+                             {"FileFolder", (folder / "carrier/")}}}},
+              {"EDIDocuments", {{{"ID", 7}, {"VendorId", 1}, {"CarrierId", 1}}}},
+              {"ConNotes", json::array()}};
+  for (int i = 0; i < 250; ++i)
+    day["ConNotes"].push_back({{"ConNoteId", 1000 + i}, {"ConNoteNo", "SRX" + std::to_string(5000 + i)},
+                               {"ConNoteDate", "2024-03-14T08:00:00"}, {"CarrierId", 1}, {"VendorId", 1}});
+  std::filesystem::create_directories(folder / "carrier");
+  test::WriteText(folder / "day.json", day.dump());
+  // Every host write is a transaction of its own: on a memory-backed folder
+  // the runs take a second rather than a minute of disk syncs.
+  const std::filesystem::path shm = "/dev/shm";
+  const std::string db = std::filesystem::is_directory(shm)
+                             ? (shm / ("quendal-cli-" + std::to_string(::getpid()))).string()
+                             : folder / "day";
+  struct Remove {
+    std::string prefix;
+    ~Remove() {
+      for (const char* suffix : {".db", "-again.db", "-plain.db"}) std::filesystem::remove(prefix + suffix);
+    }
+  } remove{db};
+  ASSERT_EQ(Run({"--db", db + ".db", "import", "day.json"}).status, 0);
+
+  // Under a terminal (script gives the command one) the count goes to stderr.
+  auto onTerminal = [&](const std::string& args) {
+    const std::string command = "cd " + Quote(folder.path()) + " && QUENDAL_NOW=2024-03-14T09:30:00 script -qec " +
+                                Quote(Quote(QUENDAL_CLI_PATH) + " " + args + " >/dev/null") + " /dev/null";
+    std::string seen;
+    if (FILE* pipe = ::popen(command.c_str(), "r")) {
+      char buffer[4096];
+      for (std::size_t n; (n = std::fread(buffer, 1, sizeof buffer, pipe)) > 0;) seen.append(buffer, n);
+      ::pclose(pipe);
+    }
+    return seen;
+  };
+  const std::string shown =
+      onTerminal("--db " + Quote(db + ".db") + " manifest clsStarTrackManifestcln --edi-doc 7 --rows 0,1,2,3");
+  EXPECT_EQ(shown.find("Process:"), std::string::npos) << shown;  // four rows: no count
+  const std::string counted = onTerminal("--db " + Quote(db + ".db") + " manifest clsStarTrackManifestcln --edi-doc 7");
+  std::size_t counts = 0;
+  for (std::size_t at = 0; (at = counted.find("\rProcess: ", at)) != std::string::npos; ++at) ++counts;
+  EXPECT_GE(counts, 100u) << counted;
+  EXPECT_NE(counted.find("Process: 246 of 246 rows"), std::string::npos) << counted;
+  const std::string again = db + "-again.db";
+  ASSERT_EQ(Run({"--db", again, "import", "day.json"}).status, 0);
+  EXPECT_EQ(onTerminal("--db " + Quote(again) + " --json manifest clsStarTrackManifestcln --edi-doc 7").find("Process:"),
+            std::string::npos);
+  // Without a terminal, nothing but the result.
+  const std::string plainDb = db + "-plain.db";
+  ASSERT_EQ(Run({"--db", plainDb, "import", "day.json"}).status, 0);
+  const Result plain = Run({"--db", plainDb, "manifest", "clsStarTrackManifestcln", "--edi-doc", "7"});
+  ASSERT_EQ(plain.status, 0);
+  EXPECT_NE(plain.out.find("Process row 249:"), std::string::npos);
+  EXPECT_EQ(plain.err, "");
 }
 
 }  // namespace

@@ -104,6 +104,14 @@ void AddMethods(MemoryHost&, MemoryObject<host::ConNote>& c) {
 
 void AddMethods(MemoryHost& host, MemoryObject<host::Manifest>& m) {
   m.fields["ManifestId"] = Var(0);
+  // The consignments that bear this manifest's id, in the order they were made.
+  m.getters["ConNotes"] = [&host, &m] {
+    auto list = std::make_shared<MemoryCollection<host::ConNotes>>();
+    const double id = m.Get("ManifestId").NumberOr(0);
+    for (const auto& c : host.conNotes)
+      if (id != 0 && c->Get("ManifestId").NumberOr(0) == id) list->items.push_back(c);
+    return Var(list);
+  };
   m.methods["Save"] = [&host, &m](std::span<const Var>) {
     if (host.manifestSaveFails) return Var(false);
     if (m.Get("ManifestId").Whole() == 0) {
@@ -114,14 +122,17 @@ void AddMethods(MemoryHost& host, MemoryObject<host::Manifest>& m) {
   };
 }
 
-// True when the consignment's vendor and carrier carry the given ids (compared as text).
+// True when the consignment's vendor and carrier carry the given ids or
+// codes (compared as text), as a row run passes ids and the summary codes.
 static bool SameVendorAndCarrier(MemoryObject<host::ConNote>& c, const Var& vendorId,
-                          const Var& carrierId) {
+                                 const Var& carrierId) {
   auto vendor = host::Object::As<host::Vendor>(c.Get("Vendor"));
   auto carrier = host::Object::As<host::Carrier>(c.Get("Carrier"));
-  const std::string v = vendor ? vendor->VendorId().Text() : std::string();
-  const std::string k = carrier ? carrier->CarrierId().Text() : std::string();
-  return v == vendorId.Text() && k == carrierId.Text();
+  const bool sameVendor = vendor && (vendor->VendorId().Text() == vendorId.Text() ||
+                                     vendor->VendorCode().Text() == vendorId.Text());
+  const bool sameCarrier = carrier && (carrier->CarrierId().Text() == carrierId.Text() ||
+                                       carrier->CarrierCode().Text() == carrierId.Text());
+  return sameVendor && sameCarrier;
 }
 
 MemoryHost::MemoryHost() : self_(std::shared_ptr<host::Library>(this, [](host::Library*) {})) {

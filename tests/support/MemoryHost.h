@@ -41,6 +41,8 @@ class MemoryObject : public T {
   explicit MemoryObject(std::string_view type) : type_(type) {}
   std::string_view TypeName() const override { return type_; }
   Var Get(std::string_view member) override {
+    if (!getters.empty())
+      if (auto getter = getters.find(member); getter != getters.end()) return getter->second();
     auto it = fields.find(member);
     return it == fields.end() ? Var() : it->second;
   }
@@ -56,6 +58,8 @@ class MemoryObject : public T {
 
   Members fields;
   std::map<std::string, Method, std::less<>> methods;
+  // Members the host works out when they are read (a manifest's consignments).
+  std::map<std::string, std::function<Var()>, std::less<>> getters;
 
  private:
   std::string type_;

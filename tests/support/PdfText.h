@@ -23,7 +23,8 @@ inline std::string Words(const std::string& text) {
   return out;
 }
 
-inline std::string PdfWords(const std::string& path) {
+// The text as pdftotext lays it out; pages end with a form feed.
+inline std::string PdfText(const std::string& path) {
   std::string text;
   if (FILE* pipe = ::popen(("pdftotext -q -layout '" + path + "' - 2>/dev/null").c_str(), "r")) {
     char buffer[4096];
@@ -31,7 +32,9 @@ inline std::string PdfWords(const std::string& path) {
     while ((n = std::fread(buffer, 1, sizeof buffer, pipe)) > 0) text.append(buffer, n);
     ::pclose(pipe);
   }
-  return Words(text);
+  return text;
 }
+
+inline std::string PdfWords(const std::string& path) { return Words(PdfText(path)); }
 
 }  // namespace quendal::test

@@ -14,6 +14,12 @@ std::string ShipToStore(const LabelValues& v) {
 std::string ShipToStoreLine(const LabelValues& v) {
   return gs1::ShipToReferenceText(v.CountryCode, v.ToPostcode, v.StoreText);
 }
+std::string CentreStore(const LabelValues& v) {
+  return gs1::ShipToReferenceData(v.CountryCode, v.ReceiverPostcode, v.StoreText);
+}
+std::string CentreStoreLine(const LabelValues& v) {
+  return gs1::ShipToReferenceText(v.CountryCode, v.ReceiverPostcode, v.StoreText);
+}
 std::string Store(const LabelValues& v) { return gs1::ReferenceData(v.StoreText); }
 std::string StoreLine(const LabelValues& v) { return gs1::ReferenceText(v.StoreText); }
 

@@ -19,6 +19,10 @@ std::string ShipToLine(const LabelValues& v);
 // (421)(90): the same, followed by the store's reference (StoreText).
 std::string ShipToStore(const LabelValues& v);
 std::string ShipToStoreLine(const LabelValues& v);
+// (421)(90) of a label through a distribution centre: the centre's postcode
+// (ReceiverPostcode), then the store's number.
+std::string CentreStore(const LabelValues& v);
+std::string CentreStoreLine(const LabelValues& v);
 // (90): the store's reference alone.
 std::string Store(const LabelValues& v);
 std::string StoreLine(const LabelValues& v);

@@ -12,7 +12,6 @@
 #include <utility>
 
 #include "labels/Elements.h"
-#include "labels/Gs1.h"
 #include "labels/LabelPrinter.h"
 
 namespace quendal {
@@ -27,20 +26,9 @@ struct StoreLabelCuts {
 // all of them: 1-6 sender, carrier, consignment and bill of lading; 7-10 the
 // delivery location's code, number, line and postcode; 11-14 the store's
 // name, number, line and postcode; 15 the SSCC's line; 16 the purchase
-// order; 17 the panel text; 18-21 the zones C and A, B and the store
-// zone/department; 22-23 the (421)(90) barcode and its line; 24-29 dates,
+// order; 17 the panel text; 18 zone C; 19 the store zone/department; 20-21
+// zones A and B; 22-23 the (421)(90) barcode and its line; 24-29 dates,
 // user texts and the sales order; 30-31 the SSCC barcode and its line.
-namespace store {
-using V = const LabelValues&;
-// The (421)(90) barcode: the delivery location's postcode and the store's number.
-inline std::string ShipToStore(V v) {
-  return gs1::ShipToReferenceData(v.CountryCode, v.ReceiverPostcode, v.StoreText);
-}
-inline std::string ShipToStoreLine(V v) {
-  return gs1::ShipToReferenceText(v.CountryCode, v.ReceiverPostcode, v.StoreText);
-}
-}  // namespace store
-
 inline constexpr std::array<BatchField, 31> kStoreLabelBatch = {{
     {1, &LabelValues::FromName},
     {2, &LabelValues::FromLine3},
@@ -63,8 +51,8 @@ inline constexpr std::array<BatchField, 31> kStoreLabelBatch = {{
     {19, &LabelValues::StoreZoneDept},
     {20, &LabelValues::ZoneDeptA},
     {21, &LabelValues::ZoneDeptB},
-    {22, store::ShipToStore},
-    {23, store::ShipToStoreLine},
+    {22, elements::CentreStore},
+    {23, elements::CentreStoreLine},
     {24, &LabelValues::PackedLine},
     {25, &LabelValues::NotBeforeLine},
     {26, &LabelValues::NotAfterLine},

@@ -2,7 +2,6 @@
 
 #include "frame/VB.h"
 #include "frame/host/Read.h"
-#include "labels/Gs1.h"
 
 namespace quendal {
 

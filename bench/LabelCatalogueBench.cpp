@@ -16,98 +16,21 @@
 
 #include <cstdio>
 #include <cstdlib>
-#include <filesystem>
 #include <map>
 #include <string>
 #include <vector>
-#include <unistd.h>
 
+#include "bench/LabelStation.h"
 #include "frame/Catalogue.h"
-#include "platform/Clock.h"
 #include "platform/MemorySpooler.h"
-#include "tests/support/MemoryHost.h"
 
 namespace quendal {
 namespace {
 
-namespace fs = std::filesystem;
-
 constexpr std::string_view kReference = "clsStarTrackGenericSCM";
 constexpr double kTarget = 1.5;
 
-// One packing station: a carton for a store that goes through its
-// distribution centre, with everything the label classes read (the
-// delivery location and the store, zones, bill of lading, the consignment's
-// packs); the settings folder its own and the clock fixed.
-struct Station {
-  Station() {
-    root = fs::temp_directory_path() / ("quendal-catalogue-bench-" + std::to_string(::getpid()));
-    fs::remove_all(root);
-    fs::create_directories(root);
-    ::setenv("XDG_CONFIG_HOME", root.c_str(), 1);
-    SetNow(DateTime::FromParts(2024, 3, 14, 10, 0));
-    host.system->fields["SpoolerMode"] = 0;
-    host.Make<host::Receiver>({{"Code", "0412"},
-                               {"PartnerId", 1},
-                               {"Name", "Harbour Stores Chadstone"},
-                               {"AddressLine1", "Shop 210"},
-                               {"AddressLine2", "1341 Dandenong Road"},
-                               {"Suburb", "CHADSTONE"},
-                               {"State", "VIC"},
-                               {"Postcode", "3148"}});
-    auto dc = host.Make<host::Receiver>(
-        {{"Name", "Harbour Stores DC"}, {"StoreCode", "0900"}, {"City", "Melbourne"}, {"Postcode", "3029"}});
-    auto conNote = host.Make<host::ConNote>({{"ConNoteNo", "SRX0001234567"},
-                                             {"BillOfLading", "BOL7781-20240314"},
-                                             {"Service", "EXP"},
-                                             {"ServiceLevel", "EXP"}});
-    pack = host.Make<host::Pack>(
-        {{"PackId", 1001},
-         {"SSCC", "00093123450000000012"},
-         {"StoreCode", "0412"},
-         {"PartnerId", 1},
-         {"SalesOrderNo", "SO10045"},
-         {"ASNId", 1},
-         {"CarrierId", 1},
-         {"Carrier", host.Make<host::Carrier>({{"Name", "Southern Road Express"},
-                                              {"Options", "#%ATL"},
-                                              {"AccountRef", "SRX01"},
-                                              {"AccountNumber", "10023456"}})},
-         {"Vendor", host.Make<host::Vendor>({{"VendorCode", "ACME"},
-                                            {"Name", "Acme Apparel Pty Ltd"},
-                                            {"AddressLine2", "12 Example Road"},
-                                            {"AddressLine3", "DANDENONG SOUTH"},
-                                            {"State", "VIC"}})},
-         {"Receiver", dc},
-         {"ShipTo", host.Make<host::Receiver>({{"Name", "Harbour Stores Chadstone"},
-                                              {"AddressLine2", "1 Example Parade"},
-                                              {"Postcode", "3148"},
-                                              {"StoreCode", "412"},
-                                              {"CountryCode", "036"}})},
-         {"Order", host.Make<host::Order>({{"OrderNo", "SO10045"},
-                                          {"StoreNo", 412},
-                                          {"Receiver", dc},
-                                          {"DeliveryAddress", host.Make<host::Address>()}})},
-         {"Despatch", host.Make<host::Despatch>({{"DespatchNo", "PO778812 REL# 2"},
-                                                {"NotBefore", DateTime::FromParts(2024, 3, 15)},
-                                                {"NotAfter", DateTime::FromParts(2024, 3, 20)},
-                                                {"ZoneDeptA", "12"},
-                                                {"ZoneDeptB", "A4-NORTH"},
-                                                {"ZoneDeptC", "WOMENSWEAR"}})},
-         {"Carton", host.Make<host::Carton>({{"Code", "CTN01"}, {"Weight", 0.45}})},
-         {"Weight", 5.2}});
-    test::MemoryHost::Attach(conNote, {pack});
-  }
-  ~Station() {
-    SetNow(std::nullopt);
-    fs::remove_all(root);
-  }
-  fs::path root;
-  test::MemoryHost host;
-  std::shared_ptr<test::MemoryObject<host::Pack>> pack;
-};
-
-Station* station = nullptr;
+bench::LabelStation* station = nullptr;
 
 void BM_PrintLabel(benchmark::State& state, const CatalogueEntry* entry) {
   auto spooler = std::make_shared<MemorySpooler>();
@@ -160,7 +83,7 @@ int main(int argc, char** argv) {
   argv = args.data();
   benchmark::Initialize(&argc, argv);
   if (benchmark::ReportUnrecognizedArguments(argc, argv)) return 1;
-  Station here;
+  bench::LabelStation here("quendal-catalogue-bench");
   station = &here;
   for (const CatalogueEntry& entry : Catalogue())
     if (entry.family == Family::Label && entry.factory)

@@ -7,13 +7,13 @@ namespace quendal {
 namespace {
 
 constexpr auto kBatch = DjsBatch(elements::Store, elements::StoreLine);
-constexpr LabelLayout kLayout{"16", vpcl::Format{"1djscm", 600, 400, djs::kPackets}, kBatch};
+constexpr LabelLayout kLayout{"16", vpcl::Format{"1djscm", 600, 400, kDjsPackets}, kBatch};
 
 }  // namespace
 
-class clsMayneDJsSCM final : public DjsLabelPrinter {
+class clsMayneDJsSCM final : public AddressLabelPrinter {
  public:
-  clsMayneDJsSCM() : DjsLabelPrinter("clsMayneDJsSCM", kLayout) {}
+  clsMayneDJsSCM() : AddressLabelPrinter("clsMayneDJsSCM", kLayout) {}
 };
 
 std::unique_ptr<Component> MakeMayneDJsSCM() { return std::make_unique<clsMayneDJsSCM>(); }

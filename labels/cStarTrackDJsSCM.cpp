@@ -7,13 +7,13 @@ namespace quendal {
 namespace {
 
 constexpr auto kBatch = DjsBatch(elements::ShipToStore, elements::ShipToStoreLine);
-constexpr LabelLayout kLayout{"22", vpcl::Format{"1djscm", 600, 400, djs::kPackets}, kBatch};
+constexpr LabelLayout kLayout{"22", vpcl::Format{"1djscm", 600, 400, kDjsPackets}, kBatch};
 
 }  // namespace
 
-class clsStarTrackDJsSCM final : public DjsLabelPrinter {
+class clsStarTrackDJsSCM final : public AddressLabelPrinter {
  public:
-  clsStarTrackDJsSCM() : DjsLabelPrinter("clsStarTrackDJsSCM", kLayout) {}
+  clsStarTrackDJsSCM() : AddressLabelPrinter("clsStarTrackDJsSCM", kLayout) {}
 };
 
 std::unique_ptr<Component> MakeStarTrackDJsSCM() { return std::make_unique<clsStarTrackDJsSCM>(); }

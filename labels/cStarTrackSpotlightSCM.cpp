@@ -7,13 +7,13 @@ namespace quendal {
 namespace {
 
 constexpr auto kBatch = DjsBatch(elements::ShipToStore, elements::ShipToStoreLine);
-constexpr LabelLayout kLayout{"135", vpcl::Format{"1djscm", 600, 400, djs::kPackets}, kBatch};
+constexpr LabelLayout kLayout{"135", vpcl::Format{"1djscm", 600, 400, kDjsPackets}, kBatch};
 
 }  // namespace
 
-class clsStarTrackSpotlightSCM final : public DjsLabelPrinter {
+class clsStarTrackSpotlightSCM final : public AddressLabelPrinter {
  public:
-  clsStarTrackSpotlightSCM() : DjsLabelPrinter("clsStarTrackSpotlightSCM", kLayout) {}
+  clsStarTrackSpotlightSCM() : AddressLabelPrinter("clsStarTrackSpotlightSCM", kLayout) {}
 };
 
 std::unique_ptr<Component> MakeStarTrackSpotlightSCM() { return std::make_unique<clsStarTrackSpotlightSCM>(); }

@@ -7,13 +7,13 @@ namespace quendal {
 namespace {
 
 constexpr auto kBatch = DjsBatch(elements::ShipTo, elements::ShipToLine);
-constexpr LabelLayout kLayout{"22", vpcl::Format{"1djscm", 600, 400, djs::kPackets}, kBatch};
+constexpr LabelLayout kLayout{"22", vpcl::Format{"1djscm", 600, 400, kDjsPackets}, kBatch};
 
 }  // namespace
 
-class clsTollDJsSCM final : public DjsLabelPrinter {
+class clsTollDJsSCM final : public AddressLabelPrinter {
  public:
-  clsTollDJsSCM() : DjsLabelPrinter("clsTollDJsSCM", kLayout) {}
+  clsTollDJsSCM() : AddressLabelPrinter("clsTollDJsSCM", kLayout) {}
 };
 
 std::unique_ptr<Component> MakeTollDJsSCM() { return std::make_unique<clsTollDJsSCM>(); }

@@ -3,18 +3,15 @@
 // SSCC element string.
 #include <benchmark/benchmark.h>
 
-#include <cstdlib>
 #include <filesystem>
 #include <fstream>
-#include <unistd.h>
 
+#include "bench/LabelStation.h"
 #include "labels/WinPrint.h"
 #include "labels/cStarTrackGenericSCM.h"
-#include "platform/Clock.h"
 #include "platform/DirectorySpooler.h"
 #include "platform/MemorySpooler.h"
 #include "platform/Settings.h"
-#include "tests/support/MemoryHost.h"
 
 #ifdef QUENDAL_BENCH_ZINT
 #include <zint.h>
@@ -25,57 +22,14 @@ namespace {
 
 namespace fs = std::filesystem;
 
-// One packing station: the host objects of a carton, its settings file,
-// the clock fixed.
-struct Station {
-  Station() {
-    root = fs::temp_directory_path() / ("quendal-bench-" + std::to_string(::getpid()));
-    fs::remove_all(root);
+// One packing station with a directory spooler's printer folder and the
+// printing switches in its settings file.
+struct Station : bench::LabelStation {
+  Station() : LabelStation("quendal-bench") {
     fs::create_directories(root / "spool" / "Dock 3");
-    ::setenv("XDG_CONFIG_HOME", (root / "config").c_str(), 1);
     SaveSetting("Merivane", "Settings", "clsStarTrackGenericSCM", "True");
     SaveSetting("Merivane", "Settings", "clsTollGenericSCM", "False");
-    SetNow(DateTime::FromParts(2024, 3, 1, 9, 30));
-    host.system->fields["SpoolerMode"] = 0;
-    host.Make<host::Receiver>({{"Code", "0412"},
-                               {"PartnerId", 3},
-                               {"Name", "Rebel Sport Chadstone"},
-                               {"AddressLine1", "Shop 1040 Chadstone Centre"},
-                               {"AddressLine2", "1341 Dandenong Road"},
-                               {"Suburb", "Chadstone"},
-                               {"State", "VIC"},
-                               {"Postcode", "3148"}});
-    auto conNote = host.Make<host::ConNote>(
-        {{"ConNoteNo", "STK000123456789"}, {"Service", "ROAD EXPRESS"}, {"ServiceLevel", "EXP"}});
-    pack = host.Make<host::Pack>(
-        {{"PackId", 1},
-         {"SSCC", "00093123450000000012"},
-         {"StoreCode", "DC"},
-         {"PartnerId", 3},
-         {"SalesOrderNo", "778123"},
-         {"ASNId", 55},
-         {"CarrierId", 7},
-         {"Carrier", host.Make<host::Carrier>({{"Name", "StarTrack Express"}, {"Options", "#%ATL"}})},
-         {"Vendor", host.Make<host::Vendor>({{"Name", "Merivane Outdoor Supplies"},
-                                            {"AddressLine2", "12 Foundry Road"},
-                                            {"AddressLine3", "Dandenong South"},
-                                            {"State", "VIC"}})},
-         {"Receiver", host.Make<host::Receiver>({{"StoreCode", "0412"}})},
-         {"ShipTo", host.Make<host::Receiver>({{"CountryCode", "036"}})},
-         {"Order", host.Make<host::Order>({{"DeliveryAddress", host.Make<host::Address>()}})},
-         {"Despatch", host.Make<host::Despatch>({{"DespatchNo", "4500012345"},
-                                                {"NotBefore", DateTime::FromParts(2024, 3, 4)},
-                                                {"NotAfter", DateTime::FromParts(2024, 3, 8)}})},
-         {"Carton", host.Make<host::Carton>({{"Code", "CTN"}})}});
-    test::MemoryHost::Attach(conNote, {pack});
   }
-  ~Station() {
-    SetNow(std::nullopt);
-    fs::remove_all(root);
-  }
-  fs::path root;
-  test::MemoryHost host;
-  std::shared_ptr<test::MemoryObject<host::Pack>> pack;
 };
 
 void BM_PrintLabelToMemorySpooler(benchmark::State& state) {

@@ -14,6 +14,7 @@
 #include "cli/Cli.h"
 #include "cli/Demo.h"
 #include "cli/Layouts.h"
+#include "cli/Gallery.h"
 #include "cli/Prompt.h"
 #include "cli/Work.h"
 #include "frame/VB.h"
@@ -63,6 +64,7 @@ struct Options {
   std::vector<std::string> jobs;
   std::string previewOut;
   int dpi = 0;
+  GalleryOptions gallery;
 };
 
 // A run shows its progress on a terminal once it has more rows than this.
@@ -352,6 +354,8 @@ class Command {
     return 0;
   }
 
+  int Gallery() { return RunGallery(Host(), o_.gallery, std::cout, o_.json); }
+
   int Despatch() {
     const CatalogueEntry& entry = BuiltClass(o_.className, Family::Consignment);
     auto conNote = ConNote(o_.conNote);
@@ -538,6 +542,19 @@ int Main(int argc, char** argv) {
   preview->add_option("--dpi", o.dpi, "the printer's resolution (default: its printer.ini, else 203)")
       ->check(CLI::Range(50, 2400));
 
+  auto* gallery = app.add_subcommand(
+      "gallery", "a picture of every built label class's label, as its label printer prints it (PNG)");
+  gallery->add_option("--out", o.gallery.out, "folder for the pictures, one <class>.png each")
+      ->capture_default_str();
+  gallery->add_option("--dpi", o.gallery.dpi, "the printer's resolution")
+      ->capture_default_str()
+      ->check(CLI::Range(50, 2400));
+  gallery->add_option("--readme", o.gallery.readme,
+                      "a Markdown file whose <!-- gallery --> ... <!-- /gallery --> block gets the pictures' table");
+  gallery->footer(
+      "Each class prints the first carton of its carrier's first consignment in the database (the demo "
+      "day's: scripts/gallery makes it) on a VPCL II printer; the last label of its jobs is drawn.");
+
   auto* despatch = app.add_subcommand("despatch", "Process(System, ConNote, ASN of its first pack, its packs)");
   despatch->add_option("CLASS", o.className, "consignment class")->required();
   despatch->add_option("--connote", o.conNote, "consignment id")->required();
@@ -643,6 +660,7 @@ int Main(int argc, char** argv) {
     if (*pdt) return command.Pdt();
     if (*packline) return command.PackLine();
     if (*preview) return command.Preview();
+    if (*gallery) return command.Gallery();
     if (*despatch) return command.Despatch();
     if (*manifest) return command.Manifest();
     if (*report) return command.Report();

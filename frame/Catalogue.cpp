@@ -18,6 +18,22 @@ std::unique_ptr<Component> MakeSCMnoSSCC();
 std::unique_ptr<Component> MakeHunterGenericSCM();
 std::unique_ptr<Component> MakeIFSDJsSCM();
 std::unique_ptr<Component> MakeIFSAPISCM();
+std::unique_ptr<Component> MakeTollGenericSCM();
+std::unique_ptr<Component> MakeTollNZSCM();
+std::unique_ptr<Component> MakeMayneGenericSCM();
+std::unique_ptr<Component> MakeStarTrackCMLSCM();
+std::unique_ptr<Component> MakeTNTCMLSCM();
+std::unique_ptr<Component> MakeMayneCMLSCMLSCP();
+std::unique_ptr<Component> MakeStarTrackDJsSCM();
+std::unique_ptr<Component> MakeTollDJsSCM();
+std::unique_ptr<Component> MakeMayneDJsSCM();
+std::unique_ptr<Component> MakeStarTrackSpotlightSCM();
+std::unique_ptr<Component> MakeStarTrackBLSCM();
+std::unique_ptr<Component> MakeStarTrackBigWSCM();
+std::unique_ptr<Component> MakeTollBigWSCM();
+std::unique_ptr<Component> MakeStarTrackBigWERSCM();
+std::unique_ptr<Component> MakeStarTrackHSSCM();
+std::unique_ptr<Component> MakeStarTrackRebelSCM();
 std::unique_ptr<Component> MakeeParcelManifestxml();
 std::unique_ptr<Component> MakeeParcelManifestEODxml();
 std::unique_ptr<Component> MakeStarTrackDAcln();
@@ -46,23 +62,23 @@ constexpr std::array kCatalogue = {
     CatalogueEntry{"clsStarTrackDAcln", Consignment, "StarTrack",
                    "CLN consignment file, dangerous goods declaration", MakeStarTrackDAcln},
     CatalogueEntry{"clsTNTDAet11", Consignment, "TNT", "ET11 file", MakeTNTDAet11},
-    CatalogueEntry{"clsStarTrackCMLSCM", Label, "StarTrack", "CML", nullptr},
-    CatalogueEntry{"clsTNTCMLSCM", Label, "TNT", "CML", nullptr},
-    CatalogueEntry{"clsStarTrackDJsSCM", Label, "StarTrack", "David Jones", nullptr},
+    CatalogueEntry{"clsStarTrackCMLSCM", Label, "StarTrack", "CML", MakeStarTrackCMLSCM},
+    CatalogueEntry{"clsTNTCMLSCM", Label, "TNT", "CML", MakeTNTCMLSCM},
+    CatalogueEntry{"clsStarTrackDJsSCM", Label, "StarTrack", "David Jones", MakeStarTrackDJsSCM},
     CatalogueEntry{"clsMayneDAcl", Consignment, "Mayne", "CL file", MakeMayneDAcl},
-    CatalogueEntry{"clsMayneCMLSCMLSCP", Label, "Mayne", "CML", nullptr},
-    CatalogueEntry{"clsMayneDJsSCM", Label, "Mayne", "David Jones", nullptr},
+    CatalogueEntry{"clsMayneCMLSCMLSCP", Label, "Mayne", "CML", MakeMayneCMLSCMLSCP},
+    CatalogueEntry{"clsMayneDJsSCM", Label, "Mayne", "David Jones", MakeMayneDJsSCM},
     CatalogueEntry{"clsIpecDA1250", Consignment, "Ipec", "1250 file", MakeIpecDA1250},
-    CatalogueEntry{"clsStarTrackBLSCM", Label, "StarTrack", "BL", nullptr},
+    CatalogueEntry{"clsStarTrackBLSCM", Label, "StarTrack", "BL", MakeStarTrackBLSCM},
     CatalogueEntry{"clsIpecDA1256", Consignment, "Ipec", "1256 file", MakeIpecDA1256},
     CatalogueEntry{"clsVicExpressDAcln", Consignment, "VicExpress", "consignment file (\".CTN\")",
                    MakeVicExpressDAcln},
     CatalogueEntry{"clsVLODAcsv", Consignment, "VLO", "map-driven CSV file", MakeVLODAcsv},
     CatalogueEntry{"clsMayneCMLSCM", Label, "Mayne", "CML", MakeMayneCMLSCM},
-    CatalogueEntry{"clsMayneGenericSCM", Label, "Mayne", "any retailer", nullptr},
+    CatalogueEntry{"clsMayneGenericSCM", Label, "Mayne", "any retailer", MakeMayneGenericSCM},
     CatalogueEntry{"clsStarTrackGenericSCM", Label, "StarTrack", "any retailer (reference class)",
                    MakeStarTrackGenericSCM},
-    CatalogueEntry{"clsTollGenericSCM", Label, "Toll", "any retailer", nullptr},
+    CatalogueEntry{"clsTollGenericSCM", Label, "Toll", "any retailer", MakeTollGenericSCM},
     CatalogueEntry{"clsAaEGenericSCM", Label, "AaE", "any retailer", MakeAaEGenericSCM},
     CatalogueEntry{"clsAaEES610", Rows, "AaE", "ES610 file", MakeAaEES610},
     CatalogueEntry{"clsDFEDAxml", Consignment, "DFE",
@@ -70,15 +86,15 @@ constexpr std::array kCatalogue = {
     CatalogueEntry{"clsDFESCM", Label, "DFE", "any retailer", MakeDFESCM},
     CatalogueEntry{"clsHunterDA", Consignment, "Hunter", "despatch file", MakeHunterDA},
     CatalogueEntry{"clsHunterGenericSCM", Label, "Hunter", "any retailer", MakeHunterGenericSCM},
-    CatalogueEntry{"clsStarTrackBigWSCM", Label, "StarTrack", "BigW", nullptr},
-    CatalogueEntry{"clsTollBigWSCM", Label, "Toll", "BigW", nullptr},
-    CatalogueEntry{"clsStarTrackHSSCM", Label, "StarTrack", "HS", nullptr},
+    CatalogueEntry{"clsStarTrackBigWSCM", Label, "StarTrack", "BigW", MakeStarTrackBigWSCM},
+    CatalogueEntry{"clsTollBigWSCM", Label, "Toll", "BigW", MakeTollBigWSCM},
+    CatalogueEntry{"clsStarTrackHSSCM", Label, "StarTrack", "HS", MakeStarTrackHSSCM},
     CatalogueEntry{"clsTollMYERSCM", Label, "Toll", "Myer", MakeTollMYERSCM},
     CatalogueEntry{"clsTNTTransactionDAcsv", Consignment, "TNT", "map-driven CSV transaction file",
                    MakeTNTTransactionDAcsv},
     CatalogueEntry{"clsAlliedExpressSEDIP", Consignment, "Allied Express", "SEDIP file",
                    MakeAlliedExpressSEDIP},
-    CatalogueEntry{"clsStarTrackRebelSCM", Label, "StarTrack", "Rebel", nullptr},
+    CatalogueEntry{"clsStarTrackRebelSCM", Label, "StarTrack", "Rebel", MakeStarTrackRebelSCM},
     CatalogueEntry{"clsIFSAPISCM", Label, "IFS", "any retailer", MakeIFSAPISCM},
     CatalogueEntry{"clsIFSDJsSCM", Label, "IFS", "David Jones", MakeIFSDJsSCM},
     CatalogueEntry{"clsAustPostSCM", Label, "Australia Post", "article-id labels",
@@ -86,8 +102,8 @@ constexpr std::array kCatalogue = {
     CatalogueEntry{"clseParcelManifestxml", Rows, "Australia Post eParcel", "PCMS manifest",
                    MakeeParcelManifestxml},
     CatalogueEntry{"clsSCMnoSSCC", Label, "any", "label without SSCC", MakeSCMnoSSCC},
-    CatalogueEntry{"clsStarTrackSpotlightSCM", Label, "StarTrack", "Spotlight", nullptr},
-    CatalogueEntry{"clsStarTrackBigWERSCM", Label, "StarTrack", "BigW", nullptr},
+    CatalogueEntry{"clsStarTrackSpotlightSCM", Label, "StarTrack", "Spotlight", MakeStarTrackSpotlightSCM},
+    CatalogueEntry{"clsStarTrackBigWERSCM", Label, "StarTrack", "BigW", MakeStarTrackBigWERSCM},
     CatalogueEntry{"clsDFESCMWinPCL", Label, "DFE", "drawn label", MakeDFESCMWinPCL},
     CatalogueEntry{"clsDFESCMsscc", Label, "DFE", "SSCC label", MakeDFESCMsscc},
     CatalogueEntry{"clsStarTrackManifestcln", Rows, "StarTrack",
@@ -101,12 +117,12 @@ constexpr std::array kCatalogue = {
                    "end-of-day CLN, consolidated manifest, dangerous goods", MakeStarTrackEODcln},
     CatalogueEntry{"clsIpecDA1250EOD", Rows, "Ipec", "1250 end of day, consolidated manifest",
                    MakeIpecDA1250EOD},
-    CatalogueEntry{"clsTollNZSCM", Label, "Toll", "NZ", nullptr},
+    CatalogueEntry{"clsTollNZSCM", Label, "Toll", "NZ", MakeTollNZSCM},
     CatalogueEntry{"clsAustPostDespatchSCM", Label, "Australia Post", "despatch article-id labels",
                    MakeAustPostDespatchSCM},
     CatalogueEntry{"clseParcelManifestEODxml", Rows, "Australia Post eParcel", "PCMS end of day",
                    MakeeParcelManifestEODxml},
-    CatalogueEntry{"clsTollDJsSCM", Label, "Toll", "David Jones", nullptr},
+    CatalogueEntry{"clsTollDJsSCM", Label, "Toll", "David Jones", MakeTollDJsSCM},
 };
 static_assert(kCatalogue.size() == 48);
 

@@ -133,6 +133,15 @@ class PrintFileInterface : public virtual Component {
   virtual bool PrintFile(const std::string& aFormat, const std::string& aBatch) = 0;
 };
 
+// The BigW label classes keep a setting for the host: whether an SSCC needs
+// an advance shipping notice. The class stores it and gives it back; it
+// does not act on it.
+class AsnRequiredInterface : public virtual Component {
+ public:
+  virtual bool ASNRequiredForSSCC() const = 0;
+  virtual void SetASNRequiredForSSCC(bool value) = 0;
+};
+
 // Members shared by consignment and row classes.
 class LifecycleInterface {
  public:

@@ -62,8 +62,8 @@ inline constexpr auto kDfePackets = vpcl::Join(kDfeBody, kDfeShipTo);
 inline constexpr auto kDfeBatch = vpcl::Join(generic::kAddressFields, generic::kPostcodeFields,
                                              generic::kOrderFields, generic::kTailFields);
 inline constexpr std::array<BatchField, 2> kDfeShipToFields = {{
-    {17, [](generic::V v) { return gs1::ShipToData(v.CountryCode, v.ToPostcode); }},
-    {18, [](generic::V v) { return gs1::ShipToText(v.CountryCode, v.ToPostcode); }},
+    {17, elements::ShipTo},
+    {18, elements::ShipToLine},
 }};
 inline constexpr auto kDfeShipToBatch = vpcl::Join(kDfeBatch, kDfeShipToFields);
 

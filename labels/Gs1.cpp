@@ -36,15 +36,25 @@ std::string ShipToText(std::string_view country, std::string_view postcode) {
 
 std::string ShipToReferenceData(std::string_view country, std::string_view postcode,
                                 std::string_view reference) {
+  if (reference.empty()) return ShipToData(country, postcode);
   return Join({kVpclFnc1, "421", country, postcode, kVpclFnc1, "90", reference});
 }
 std::string ShipToReferenceZpl(std::string_view country, std::string_view postcode,
                                std::string_view reference) {
+  if (reference.empty()) return ShipToZpl(country, postcode);
   return Join({kZplStart, kZplFnc1, "421", country, postcode, kZplFnc1, "90", reference});
 }
 std::string ShipToReferenceText(std::string_view country, std::string_view postcode,
                                 std::string_view reference) {
+  if (reference.empty()) return ShipToText(country, postcode);
   return Join({"(421)", country, postcode, "(90)", reference});
+}
+
+std::string ReferenceData(std::string_view reference) {
+  return reference.empty() ? std::string() : Join({kVpclFnc1, "90", reference});
+}
+std::string ReferenceText(std::string_view reference) {
+  return reference.empty() ? std::string() : Join({"(90)", reference});
 }
 
 }  // namespace quendal::gs1

@@ -23,12 +23,19 @@ std::string ShipToData(std::string_view country, std::string_view postcode);
 std::string ShipToZpl(std::string_view country, std::string_view postcode);
 std::string ShipToText(std::string_view country, std::string_view postcode);
 
-// (421) is variable-length, so FNC1 comes again before (90).
+// (421) is variable-length, so FNC1 comes again before (90). An empty
+// reference leaves (90) out: the identifier without data does not scan as
+// GS1, so the barcode carries the ship-to postal code alone.
 std::string ShipToReferenceData(std::string_view country, std::string_view postcode,
                                 std::string_view reference);
 std::string ShipToReferenceZpl(std::string_view country, std::string_view postcode,
                                std::string_view reference);
 std::string ShipToReferenceText(std::string_view country, std::string_view postcode,
                                 std::string_view reference);
+
+// A reference under (90) alone ("~20190" + reference, "(90)" + reference);
+// empty for an empty reference.
+std::string ReferenceData(std::string_view reference);
+std::string ReferenceText(std::string_view reference);
 
 }  // namespace quendal::gs1

@@ -2,7 +2,6 @@
 
 #include "frame/VB.h"
 #include "frame/host/Read.h"
-#include "labels/Gs1.h"
 
 namespace quendal {
 
@@ -11,41 +10,12 @@ namespace {
 using V = const LabelValues&;
 bool HasPanel(V v) { return !v.PanelText.empty(); }
 
-}  // namespace
+// A store's number as the labels print it: four digits.
+std::string StoreNumber(const Ref<host::Receiver>& store) {
+  return Format(host::Read(store, &host::Receiver::StoreCode), "0000");
+}
 
-const std::array<BatchField, 31> kStoreLabelBatch = {{
-    {1, &LabelValues::FromName},
-    {2, &LabelValues::FromLine3},
-    {3, &LabelValues::FromState},
-    {4, &LabelValues::CarrierName},
-    {5, &LabelValues::ConNoteNo},
-    {6, &LabelValues::BillOfLading},
-    {7, &LabelValues::LocationCode},
-    {8, &LabelValues::LocationNumber},
-    {9, &LabelValues::ReceiverLine},
-    {10, &LabelValues::ReceiverPostcode},
-    {11, &LabelValues::ForName},
-    {12, &LabelValues::StoreText},
-    {13, &LabelValues::ForLine},
-    {14, &LabelValues::ForPostcode},
-    {15, [](V v) { return gs1::SsccText(v.SSCC); }},
-    {16, &LabelValues::PurchaseOrderLine},
-    {17, &LabelValues::PanelText},
-    {18, &LabelValues::ZoneDeptC},
-    {19, &LabelValues::StoreZoneDept},
-    {20, &LabelValues::ZoneDeptA},
-    {21, &LabelValues::ZoneDeptB},
-    {22, [](V v) { return gs1::ShipToReferenceData(v.CountryCode, v.ReceiverPostcode, v.StoreText); }},
-    {23, [](V v) { return gs1::ShipToReferenceText(v.CountryCode, v.ReceiverPostcode, v.StoreText); }},
-    {24, &LabelValues::PackedLine},
-    {25, &LabelValues::NotBeforeLine},
-    {26, &LabelValues::NotAfterLine},
-    {27, &LabelValues::UserText1},
-    {28, &LabelValues::UserText2},
-    {29, &LabelValues::SalesOrderLine},
-    {30, [](V v) { return gs1::SsccData(v.SSCC); }},
-    {31, [](V v) { return gs1::SsccText(v.SSCC); }},
-}};
+}  // namespace
 
 const std::array<zpl::Piece, 37> kStoreLabelZpl = {{
     {"^XA^MCY^XZ^XA^SZ2^MMT^MTT~JSN^LT0^MD0^MNY^PRA^PON^PMN^CI0^LRN"},
@@ -92,16 +62,10 @@ const std::array<zpl::Piece, 37> kStoreLabelZpl = {{
     {"^PQ1,0,0,N^MCN^XZ"},
 }};
 
-StoreLabelPrinter::StoreLabelPrinter(std::string_view className, const LabelLayout& layout,
-                                     StoreLabelCuts cuts)
-    : LabelPrinter(className, layout), cuts_(cuts) {}
-
-bool StoreLabelPrinter::FillValues(Procedure& proc) {
-  if (!LabelPrinter::FillValues(proc)) return false;
+bool ReadStoreLabelValues(Procedure& proc, const Ref<host::Pack>& pack, LabelValues& v,
+                          StoreLabelCuts cuts) {
   using host::Read;
-  LabelValues& v = values_;
   Ref<host::Receiver> location;
-  Ref<host::Receiver> store;
   Ref<host::Despatch> despatch;
   return proc([&] {
            v.ConNoteNo = Left(v.ConNoteNo, 12);
@@ -109,25 +73,25 @@ bool StoreLabelPrinter::FillValues(Procedure& proc) {
          }) &&
          // Without an advance shipping notice there is no consignment to print.
          proc([&] {
-           if (!pack_->ASNId().IsNull())
-             v.BillOfLading = Left(pack_->ConNote()->BillOfLading().Text(), 12);
+           if (!pack->ASNId().IsNull())
+             v.BillOfLading = Left(pack->ConNote()->BillOfLading().Text(), 12);
          }) &&
-         proc([&] { location = pack_->Receiver(); }) &&
+         proc([&] { location = pack->Receiver(); }) &&
          proc([&] {
            v.LocationNumber = Format(Read(location, &host::Receiver::StoreCode), "0000");
            v.LocationCode = UCase(Left(Trim(Read(location, &host::Receiver::City).Text()),
-                                       cuts_.locationCode));
+                                       cuts.locationCode));
            v.ReceiverLine = UCase(Left(Trim(Read(location, &host::Receiver::Name).Text()), 30));
            v.ReceiverPostcode = Left(Read(location, &host::Receiver::Postcode).Text(), 4);
          }) &&
-         proc([&] { store = pack_->ShipTo(); }) &&
          proc([&] {
-           v.ForName = UCase(Left(Trim(Read(store, &host::Receiver::Name).Text()), cuts_.storeName));
+           const Ref<host::Receiver> store = pack->ShipTo();
+           v.ForName = UCase(Left(Trim(Read(store, &host::Receiver::Name).Text()), cuts.storeName));
            v.ForLine = UCase(Left(Trim(Read(store, &host::Receiver::AddressLine2).Text()), 15));
            v.ForPostcode = Left(Read(store, &host::Receiver::Postcode).Text(), 4);
-           v.StoreText = Format(Read(store, &host::Receiver::StoreCode), "0000");
+           v.StoreText = StoreNumber(store);
          }) &&
-         proc([&] { despatch = pack_->Despatch(); }) &&
+         proc([&] { despatch = pack->Despatch(); }) &&
          proc([&] {
            v.ZoneDeptA = Read(despatch, &host::Despatch::ZoneDeptA).Text();
            v.ZoneDeptB = Left(Read(despatch, &host::Despatch::ZoneDeptB).Text(), 4);
@@ -139,6 +103,10 @@ bool StoreLabelPrinter::FillValues(Procedure& proc) {
            if (const long release = InStr(number, " REL# "); release > 0) number = Left(number, release - 1);
            v.PurchaseOrderLine = "PO " + Left(number, 22);
          });
+}
+
+bool ReadStoreNumber(Procedure& proc, const Ref<host::Pack>& pack, LabelValues& v) {
+  return proc([&] { v.StoreText = StoreNumber(pack->ShipTo()); });
 }
 
 }  // namespace quendal

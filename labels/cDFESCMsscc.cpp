@@ -3,6 +3,7 @@
 #include <array>
 
 #include "labels/GenericLabel.h"
+#include "labels/Gs1.h"
 
 namespace quendal {
 

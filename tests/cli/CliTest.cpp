@@ -234,6 +234,25 @@ TEST_F(CliTest, PreviewDrawsJobsAsTheLabelPrinterPrintsThem) {
   ExpectOneLineError(Run({"preview", "missing.prn"}), 2, "cannot read missing.prn");
 }
 
+TEST_F(CliTest, GalleryDrawsEveryBuiltLabelClassAndRewritesOnlyItsBlock) {
+  ASSERT_EQ(Run({"import", Example()}).status, 0);
+  test::WriteText(folder / "README.md", "# Labels\nSee `<!-- gallery -->` below.\n<!-- gallery -->\nold\n<!-- /gallery -->\nEnd\n");
+  const Result r = Run({"--json", "gallery", "--out", "docs/gallery", "--readme", "README.md"});
+  ASSERT_EQ(r.status, 0) << r.err;
+  std::size_t built = 0;
+  for (const auto& entry : Catalogue()) built += entry.family == Family::Label && entry.factory ? 1 : 0;
+  ASSERT_EQ(r.Json()["pictures"].size(), built) << r.out;
+  for (const auto& picture : r.Json()["pictures"])
+    EXPECT_TRUE(test::ReadText(folder / picture["file"].get<std::string>()).starts_with("\x89PNG")) << picture;
+  const std::string readme = test::ReadText(folder / "README.md");
+  EXPECT_TRUE(readme.starts_with("# Labels\nSee `<!-- gallery -->` below.\n<!-- gallery -->\n")) << readme;
+  EXPECT_TRUE(readme.ends_with("</table>\n<!-- /gallery -->\nEnd\n")) << readme;
+  EXPECT_NE(readme.find("<img src=\"docs/gallery/clsStarTrackGenericSCM.png\""), std::string::npos);
+  EXPECT_EQ(readme.find("old"), std::string::npos);
+  test::WriteText(folder / "NOTES.md", "no marks\n");
+  ExpectOneLineError(Run({"gallery", "--readme", "NOTES.md"}), 1, "NOTES.md has no <!-- gallery -->");
+}
+
 // --cups prints through the private CUPS server that scripts/test starts; the
 // queue's device is a file, which receives the label batch.
 TEST_F(CliTest, LabelsThroughCups) {

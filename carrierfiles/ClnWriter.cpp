@@ -1,5 +1,7 @@
 #include "carrierfiles/ClnWriter.h"
 
+#include "platform/FileLock.h"
+
 #include <algorithm>
 #include <array>
 #include <vector>
@@ -11,6 +13,7 @@
 #include "platform/Clock.h"
 #include "platform/CodePage.h"
 #include "platform/DirectorySpooler.h"
+#include "platform/FileLock.h"
 
 namespace quendal {
 
@@ -226,6 +229,17 @@ bool ClnWriter::Write(Procedure& proc, const ClnConsignment& c,
       }))
     return false;
 
+  // From the duplicate check to the append the file is this station's
+  // alone: another station can neither add the same consignment in between
+  // nor write its records among ours.
+  FileLock lock;
+  if (!proc([&] {
+        if (lock.Acquire(path)) return true;
+        owner_.LogLine(err::kPathFileAccess, kOpenFile, "Cannot open file " + folder);
+        return false;
+      }))
+    return false;
+
   if (!proc([&] {
         if (!index_.Holds(path, NumberKey(no))) return true;
         owner_.LogLine(0, kOpenFile, "Cannot process, connoteno already exists " + no);
@@ -384,6 +398,8 @@ bool ClnWriter::Write(Procedure& proc, const ClnConsignment& c,
         const auto before = file_.Stamp();
         if (!file_.Append(records)) throw Error(err::kDeviceIO);
         index_.Appended(path, records, before, file_.Stamp());
+        file_.Close();
+        lock.Release();
       }))
     return false;
   // The consignment is whole in the file; only now may the caller mark it

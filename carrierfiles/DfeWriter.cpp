@@ -12,6 +12,7 @@
 #include "manifests/XmlWriting.h"
 #include "platform/Clock.h"
 #include "platform/DirectorySpooler.h"
+#include "platform/FileLock.h"
 
 namespace quendal {
 
@@ -439,6 +440,13 @@ bool DfeWriter::AddToDayFile(const std::string& path, const std::string& no,
                          " cannot be read as a DFE despatch advice; it is kept and ConNote " + no +
                          " is written to " + file + ".");
   };
+  // The day's file and the files beside it are this station's alone from
+  // the duplicate check to the addition.
+  FileLock lock;
+  if (!lock.Acquire(path)) {
+    owner_.LogLine(err::kPathFileAccess, kOpenFile, "Cannot open file " + path);
+    return false;
+  }
   for (int n = 1; n <= kMaxBeside; ++n) {
     const std::string file = n == 1 ? path : PathBeside(path, n);
     // An addition that a crash interrupted is completed before anything else.

@@ -9,6 +9,7 @@
 #include "platform/Clock.h"
 #include "platform/CodePage.h"
 #include "platform/DirectorySpooler.h"
+#include "platform/FileLock.h"
 
 namespace quendal {
 
@@ -148,6 +149,16 @@ bool LayoutWriter::Write(Procedure& proc, const LayoutConsignment& c,
   std::string path;
   if (!proc([&] { path = TargetFile(carrier, c.folder); })) return false;
 
+  // Until the consignment is in, the file is this station's alone: whether
+  // it needs a header, and where its trailer starts, stay as read here.
+  FileLock lock;
+  if (!proc([&] {
+        if (lock.Acquire(path)) return true;
+        owner_.LogLine(err::kPathFileAccess, kOpenFile, "Cannot open file " + c.folder);
+        return false;
+      }))
+    return false;
+
   // An addition that a crash interrupted is completed before anything else.
   TailJournal journal(path, kTrailerWindow);
   if (!proc([&] {
@@ -265,6 +276,8 @@ bool LayoutWriter::Write(Procedure& proc, const LayoutConsignment& c,
         }))
       return false;
   }
+  file_.Close();
+  lock.Release();
   // The consignment is whole in the file; only now may the caller mark it done.
   if (written && !written()) return false;
   const bool done = true;

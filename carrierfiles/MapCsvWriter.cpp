@@ -7,6 +7,7 @@
 #include "frame/host/Read.h"
 #include "platform/Clock.h"
 #include "platform/DirectorySpooler.h"
+#include "platform/FileLock.h"
 
 namespace quendal {
 
@@ -131,9 +132,6 @@ void MapCsvWriter::Compile(const Ref<host::ConNote>& objConNote, const Ref<host:
   if (!proc([&] {
         // The name's start is a host text: it may not lead out of the folder.
         path = folder + SafeNamePart(start) + "_" + Format(Var(Now()), "ddmmyyhhss") + ".txt";
-        if (File().Open(path)) return true;
-        LogLine(err::kPathFileAccess, kOpenFile, "Cannot open file " + path);
-        return false;
       }))
     return;
 
@@ -173,9 +171,21 @@ void MapCsvWriter::Compile(const Ref<host::ConNote>& objConNote, const Ref<host:
     added.push_back(std::move(sscc));
   }
 
+  // Stations that write in the same second share the file: each appends
+  // under the file's lock, so a failed write that is cut back never takes
+  // another station's lines with it.
+  FileLock lock;
+  if (!proc([&] {
+        if (lock.Acquire(path) && File().Open(path)) return true;
+        LogLine(err::kPathFileAccess, kOpenFile, "Cannot open file " + path);
+        return false;
+      }))
+    return;
   // The consignment goes into the file in one write, so the file never holds part of it.
   if (!proc([&] {
         if (!File().Append(lines)) throw Error(err::kDeviceIO);
+        CloseOpenFile();
+        lock.Release();
       }))
     return;
   for (const std::string& sscc : added) {

@@ -10,6 +10,7 @@
 #include "frame/host/Read.h"
 #include "platform/Clock.h"
 #include "platform/DirectorySpooler.h"
+#include "platform/FileLock.h"
 #include "platform/CodePage.h"
 
 namespace quendal {
@@ -217,6 +218,17 @@ void clsTNTDAet11::Compile(const Ref<host::ConNote>& objConNote, const Ref<host:
         // One file per account and day; the folder text ends with its separator.
         path = folder + SafeNamePart(Read(carrier, &host::Carrier::AccountRef).Text()) +
                Format(Var(Today()), "DDMM") + "1200.TXT";
+      }))
+    return;
+
+  // From here to the end of the call the file is this station's alone: the
+  // batch values and the line count it reads stay true until its own
+  // consignment and trailer are in.
+  FileLock lock;
+  if (!proc([&] {
+        if (lock.Acquire(path)) return true;
+        LogLine(err::kPathFileAccess, kOpenFile, "Cannot open file " + folder);
+        return false;
       }))
     return;
 

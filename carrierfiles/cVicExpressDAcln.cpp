@@ -6,6 +6,7 @@
 #include "frame/VB.h"
 #include "frame/host/Read.h"
 #include "platform/Clock.h"
+#include "platform/FileLock.h"
 #include "platform/FileSystem.h"
 
 namespace quendal {
@@ -90,8 +91,11 @@ void clsVicExpressDAcln::Compile(const Ref<host::ConNote>& objConNote, const Ref
       }))
     return;
 
+  // Until the consignment is in, the file is this station's alone, so the
+  // header goes into an empty file once and no other records come between ours.
+  FileLock lock;
   if (!proc([&] {
-        if (File().Open(path)) return true;
+        if (lock.Acquire(path) && File().Open(path)) return true;
         LogLine(err::kPathFileAccess, "Open carrier message file", "Cannot open file " + folder);
         return false;
       }))

@@ -9,6 +9,7 @@
 #include "frame/Error.h"
 #include "frame/VB.h"
 #include "platform/CairoCanvas.h"
+#include "platform/FileLock.h"
 #include "platform/FileSystem.h"
 
 namespace quendal {
@@ -114,6 +115,14 @@ std::string DirectorySpooler::NextJobPath(const std::string& name, const std::st
       .string();
 }
 
+std::string DirectorySpooler::WriteNextJob(const std::string& name, const std::string& documentName,
+                                           const std::string& extension, std::string_view bytes) {
+  FileLock numbering;
+  if (!numbering.Acquire((fs::path(PrinterFolder(name)) / ".jobcounter").string())) return {};
+  const std::string path = NextJobPath(name, documentName, extension);
+  return ReplaceFile(path, bytes) ? path : std::string();
+}
+
 std::int32_t DirectorySpooler::StartDoc(std::int32_t handle, const std::string& documentName) {
   auto it = open_.find(handle);
   if (it == open_.end()) return 0;
@@ -142,8 +151,8 @@ bool DirectorySpooler::EndDoc(std::int32_t handle) {
     extension = "pdf";
   }
   // The job appears whole: written beside the queue, then renamed into it.
-  const std::string path = NextJobPath(doc.printer, name, extension);
-  const bool ok = ReplaceFile(path, doc.bytes);
+  const std::string path = WriteNextJob(doc.printer, name, extension, doc.bytes);
+  const bool ok = !path.empty();
   if (ok && extension == "prn") WritePreview(doc.printer, path, doc.bytes);
   doc.document.clear();
   doc.bytes.clear();
@@ -218,7 +227,7 @@ class DirectoryDC : public DeviceContext {
     if (pageOpen_) EndPage();
     bool ok = true;
     for (const std::string& page : canvas_->Pages())
-      ok = ReplaceFile(spooler_.NextJobPath(printer_, document_, "png"), page) && ok;
+      ok = !spooler_.WriteNextJob(printer_, document_, "png", page).empty() && ok;
     document_.clear();
     return ok;
   }

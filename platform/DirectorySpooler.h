@@ -61,6 +61,12 @@ class DirectorySpooler : public Spooler {
   // Reserves the next job file name "NNNNNN-<document>.<extension>" in a printer's folder.
   std::string NextJobPath(const std::string& name, const std::string& documentName,
                           const std::string& extension);
+  // Writes a job file under the next number and returns its path (empty
+  // when it could not be written). The printer folder's numbering is locked
+  // from reading the counter until the job is in the queue, so processes
+  // printing to one folder never take the same number.
+  std::string WriteNextJob(const std::string& name, const std::string& documentName,
+                           const std::string& extension, std::string_view bytes);
 
  private:
   // A number from printer.ini within [low, high], else `fallback`.

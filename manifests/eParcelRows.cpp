@@ -7,6 +7,7 @@
 #include "labels/WinPrint.h"
 #include "platform/Clock.h"
 #include "platform/DirectorySpooler.h"
+#include "platform/FileLock.h"
 #include "platform/FileSystem.h"
 
 namespace quendal {
@@ -14,6 +15,8 @@ namespace quendal {
 namespace {
 
 constexpr std::size_t kRowColumns = 6;
+// What the runs of one folder lock while they look for, read and rewrite the day's file.
+constexpr const char* kDayFileLock = "PCMS manifest";
 
 void AppendContentsItem(pugi::xml_node parent) {
   pcms::AppendText(parent.append_child("ContentsItem"), "GoodsDescription", "Apparel");
@@ -90,15 +93,22 @@ std::int32_t eParcelRows::ProcessRow(Procedure& proc, const Ref<host::ConNote>& 
         }))
       return result;
   }
+  // A run begins by moving in what runs that died before their Term left.
+  if (!document_) {
+    FileLock lock;
+    if (!LockDayFile(proc, lock) || !MoveInAbandoned(proc)) return result;
+  }
   // The run's document is kept only once a whole consignment is in it: a
   // first row whose consignment cannot be read leaves no header behind.
   std::unique_ptr<pcms::Document> started;
+  std::string skeleton;
   if (!proc([&] {
         if (document_) return;
         manifestNumber_ = variant_.manifestRecord ? manifest_->ManifestNumber().Text()
                                                   : Format(Var(Now()), "YYMMDDHHMM");
-        fileName_ = carrier_->FileFolder().Text() + DayFileName();
+        fileName_ = DayFolder() + DayFileName(manifestNumber_);
         started = StartDocument(conNote);
+        skeleton = started->FileText();
       }))
     return result;
   pcms::Document* document = document_ ? document_.get() : started.get();
@@ -124,7 +134,34 @@ std::int32_t eParcelRows::ProcessRow(Procedure& proc, const Ref<host::ConNote>& 
   if (listed) return result;
   // A consignment that is not in the document is neither stamped nor reported done.
   if (!appended) return result;
-  if (started) document_ = std::move(started);
+  // The consignment is durable in the run's journal before the host hears
+  // of it: a process that dies before Term leaves it for the next run.
+  bool kept = false;
+  if (!proc([&] {
+        const pugi::xml_node added = document->PCMSManifest().last_child();
+        std::unique_ptr<pcms::Document> single =
+            pcms::Document::Parse(started ? skeleton : skeleton_);
+        if (single) {
+          single->PCMSManifest().append_copy(added);
+          if (!journal_) journal_ = std::make_unique<RowJournal>(DayFolder(), ClassName());
+          kept = journal_->Add(single->FileText());
+        }
+        if (kept) return;
+        document->PCMSManifest().remove_child(added);
+        const std::string number =
+            pcms::ConsignmentNumber(carrier_->AccountRef(), conNote->ConNoteNo());
+        runNumbers_.erase(number);
+        WriteLog(err::kPathFileAccess, "Process",
+                 "Consignment " + number + " cannot be kept for the manifest file in " +
+                     DayFolder() + "; it is not added.");
+        vtErrorLog = {LastLogId()};
+      }) ||
+      !kept)
+    return result;
+  if (started) {
+    document_ = std::move(started);
+    skeleton_ = std::move(skeleton);
+  }
   if (variant_.manifestRecord) {
     if (!proc([&] {
           conNote->SetManifestId(manifest_->ManifestId());
@@ -145,21 +182,31 @@ std::int32_t eParcelRows::ProcessRow(Procedure& proc, const Ref<host::ConNote>& 
 }
 
 bool eParcelRows::TermWork(Procedure& proc) {
+  // The day's file is this run's alone while it is read and rewritten.
+  FileLock lock;
+  if (!LockDayFile(proc, lock) || !MoveInAbandoned(proc)) return false;
   if (!document_) return true;
+  if (!WriteRun(proc, *document_, fileName_)) return false;
+  document_.reset();
+  runNumbers_.clear();
+  // Its consignments are in the file: the journal has done its work.
+  if (journal_) journal_->Clear();
+  return true;
+}
+
+bool eParcelRows::WriteRun(Procedure& proc, const pcms::Document& run, const std::string& newFile) {
   std::string target;
   if (!proc([&] {
         // The day's file as it stands now: another run may have written it
         // since this run began.
-        target = fileName_;
-        if (auto today = TodaysFile()) target = carrier_->FileFolder().Text() + *today;
+        target = newFile;
+        if (auto today = TodaysFile()) target = DayFolder() + *today;
       }))
     return false;
   pcms::DayFileWritten written;
-  if (!proc([&] { written = pcms::WriteDayFile(target, *document_); })) return false;
+  if (!proc([&] { written = pcms::WriteDayFile(target, run); })) return false;
   // Nothing written: the run's consignments stay for another Term.
   if (written.path.empty()) return false;
-  document_.reset();
-  runNumbers_.clear();
   for (const std::string& number : written.alreadyInFile) {
     if (!proc([&] {
           WriteLog(0, "Term",
@@ -181,6 +228,42 @@ bool eParcelRows::TermWork(Procedure& proc) {
   return true;
 }
 
+bool eParcelRows::MoveInAbandoned(Procedure& proc) {
+  bool left = false;
+  std::string folder;
+  if (!proc([&] { folder = DayFolder(); })) return false;
+  if (!FolderExists(folder)) return true;
+  RowJournal::TakeAbandoned(folder, ClassName(), [&](const std::vector<std::string>& records) {
+    if (left) return false;
+    // The records of one run share its header; together they are that run's document.
+    std::unique_ptr<pcms::Document> run;
+    for (const std::string& record : records) {
+      std::unique_ptr<pcms::Document> one = pcms::Document::Parse(record);
+      if (!one) continue;
+      if (!run)
+        run = std::move(one);
+      else
+        run->AppendConsignmentsOf(*one);
+    }
+    if (!run) return true;
+    const std::string number = run->PCMSManifest().child("ManifestNumber").text().as_string();
+    if (WriteRun(proc, *run, folder + DayFileName(number))) return true;
+    left = true;
+    return false;
+  });
+  return !left;
+}
+
+std::string eParcelRows::DayFolder() { return carrier_ ? carrier_->FileFolder().Text() : std::string(); }
+
+bool eParcelRows::LockDayFile(Procedure& proc, FileLock& lock) {
+  return proc([&] {
+    // Without its folder there is no day's file to guard; writing will say so.
+    const std::string folder = DayFolder();
+    if (FolderExists(folder)) lock.Acquire(folder + kDayFileLock);
+  });
+}
+
 std::unique_ptr<pcms::Document> eParcelRows::StartDocument(const Ref<host::ConNote>& conNote) {
   auto document = std::make_unique<pcms::Document>();
   CreatePCMSHeader(document->SendPCMSManifest(), conNote);
@@ -194,8 +277,8 @@ std::unique_ptr<pcms::Document> eParcelRows::StartDocument(const Ref<host::ConNo
   return document;
 }
 
-std::string eParcelRows::DayFileName() {
-  return SafeNamePart(Left(UCase(carrier_->AccountRef().Text()), 4)) + "_" + SafeNamePart(manifestNumber_) +
+std::string eParcelRows::DayFileName(const std::string& manifestNumber) {
+  return SafeNamePart(Left(UCase(carrier_->AccountRef().Text()), 4)) + "_" + SafeNamePart(manifestNumber) +
          "_" + SafeNamePart(carrier_->Options().Text()) + ".xml";
 }
 

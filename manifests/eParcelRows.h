@@ -11,7 +11,9 @@
 #include <vector>
 
 #include "manifests/PcmsDocument.h"
+#include "manifests/RowJournal.h"
 #include "manifests/RowWriter.h"
+#include "platform/FileLock.h"
 
 namespace quendal {
 
@@ -88,12 +90,26 @@ class eParcelRows : public RowWriter {
   // A new document for the run: header, body and the PCMSManifest fields.
   std::unique_ptr<pcms::Document> StartDocument(const Ref<host::ConNote>& conNote);
   // The name of a new day's file: account, manifest number and carrier options.
-  std::string DayFileName();
+  std::string DayFileName(const std::string& manifestNumber);
+  // Adds a run's document to the day's file as it stands now, as steps of
+  // `proc`; false when nothing could be written.
+  bool WriteRun(Procedure& proc, const pcms::Document& run, const std::string& newFile);
+  // Moves into the day's file the consignments that runs which ended
+  // without Term left in their journals; false when a step was left.
+  bool MoveInAbandoned(Procedure& proc);
+  // The folder of the day's file, where the journals lie too.
+  std::string DayFolder();
+  // Takes the lock the runs of the folder share for the day's file and the journals.
+  bool LockDayFile(Procedure& proc, FileLock& lock);
   // The first file of the scanned folder created today whose name ends in ".XML".
   std::optional<std::string> TodaysFile();
 
   const eParcelVariant& variant_;
   std::unique_ptr<pcms::Document> document_;
+  // document_ before its first consignment: what each journal record starts from.
+  std::string skeleton_;
+  // The run's finished consignments, durable before they are stamped.
+  std::unique_ptr<RowJournal> journal_;
   // The consignment numbers in document_.
   std::unordered_set<std::string> runNumbers_;
   std::string manifestNumber_;

@@ -240,6 +240,7 @@ TEST_F(eParcelManifestTest, AnUnreadableDayFileIsKeptAndTheRunGoesBesideIt) {
 }
 
 TEST_F(eParcelManifestTest, AFileThatCannotBeWrittenIsReportedAndKeptForAnotherTerm) {
+  std::filesystem::create_directories(dir / "later");
   carrier->fields["FileFolder"] = Var(folder + "later/");
   ExpressToJSmith();
   auto prompt = std::make_shared<test::ScriptedPrompt>();  // answers Abort
@@ -251,14 +252,33 @@ TEST_F(eParcelManifestTest, AFileThatCannotBeWrittenIsReportedAndKeptForAnotherT
   rows->Load("", grid);
   LogList log;
   ASSERT_EQ(rows->Process(0, log), 102);
+  // The folder goes away before Term (the share dropped, say).
+  std::filesystem::rename(dir / "later", dir / "away");
   EXPECT_FALSE(rows->Term());
+  std::filesystem::rename(dir / "away", dir / "later");
   ASSERT_EQ(prompt->messages.size(), 1u);
   EXPECT_NE(prompt->messages[0].find("#76"), std::string::npos);
   EXPECT_NE(prompt->messages[0].find("ceParcelManifestxml, Function Term"), std::string::npos);
 
-  std::filesystem::create_directories(dir / "later");
   EXPECT_TRUE(rows->Term());
   EXPECT_EQ(Values("later/NPP1_1000_EP.xml", "//ConsignmentNumber"), Strings{"NPP10000077"});
+}
+
+TEST_F(eParcelManifestTest, AConsignmentThatCannotBeKeptUntilTermIsNeitherStampedNorReportedDone) {
+  carrier->fields["FileFolder"] = Var(folder + "missing/");
+  auto conNote = ExpressToJSmith();
+  auto object = CreateObject(kManifestClass).object;
+  auto* rows = as<RowInterface>(object);
+  Grid columns, grid;
+  rows->Init(host.system, 7, columns);
+  rows->Load("", grid);
+  LogList log;
+  EXPECT_EQ(rows->Process(0, log), 0);
+  ASSERT_EQ(log.size(), 1u);
+  EXPECT_EQ(host.LogMessages().back(), "Consignment NPP10000077 cannot be kept for the manifest file in " +
+                                           folder + "missing/; it is not added.");
+  EXPECT_EQ(conNote->Get("ManifestId").NumberOr(0), 0);
+  EXPECT_TRUE(rows->Term());  // nothing to write
 }
 
 TEST_F(eParcelManifestTest, NothingIsWrittenWithoutAConsignmentInTheDocument) {
@@ -272,7 +292,7 @@ TEST_F(eParcelManifestTest, NothingIsWrittenWithoutAConsignmentInTheDocument) {
   EXPECT_EQ(Run(kManifestClass, {0}), (std::vector<std::int32_t>{1, 0}));
   EXPECT_EQ(host.LogMessages().back(), "Failed to create mainifest ID");
   EXPECT_EQ(host.logs.back().at("Procedure").Text(), "Process");
-  EXPECT_TRUE(conNote->Get("ManifestId").IsNull());
+  EXPECT_EQ(conNote->Get("ManifestId").NumberOr(0), 0);
   EXPECT_TRUE(FilesInFolder().empty());
 }
 

@@ -109,8 +109,10 @@ class eParcelFixture : public ::testing::Test {
 
   std::vector<std::string> FilesInFolder() const {
     std::vector<std::string> names;
+    // Hidden files (locks, journals) are no carrier files.
     for (const auto& entry : std::filesystem::directory_iterator(dir))
-      names.push_back(entry.path().filename());
+      if (!entry.path().filename().string().starts_with("."))
+        names.push_back(entry.path().filename());
     std::sort(names.begin(), names.end());
     return names;
   }

@@ -21,15 +21,6 @@ constexpr std::string_view kMagic = "QTJ1";
 constexpr std::size_t kHeader = 4 + 5 * 8;
 constexpr std::size_t kChecksum = 8;
 
-std::uint64_t Checksum(std::string_view bytes) {
-  std::uint64_t hash = 14695981039346656037ull;
-  for (unsigned char c : bytes) {
-    hash ^= c;
-    hash *= 1099511628211ull;
-  }
-  return hash;
-}
-
 void PutNumber(std::string& out, std::uint64_t value) {
   for (int i = 0; i < 8; ++i) out.push_back(static_cast<char>((value >> (8 * i)) & 0xFF));
 }
@@ -59,7 +50,7 @@ std::string Encode(const Entry& entry) {
   PutNumber(out, entry.bytes.size());
   out += entry.oldTail;
   out += entry.bytes;
-  PutNumber(out, Checksum(out));
+  PutNumber(out, Fnv1a(out));
   return out;
 }
 
@@ -78,7 +69,7 @@ std::optional<Entry> Decode(std::string_view journal) {
   const std::uint64_t body = journal.size() - kHeader - kChecksum;
   if (oldLength > body || length != body - oldLength) return std::nullopt;
   const std::size_t end = journal.size() - kChecksum;
-  if (GetNumber(journal, end) != Checksum(journal.substr(0, end))) return std::nullopt;
+  if (GetNumber(journal, end) != Fnv1a(journal.substr(0, end))) return std::nullopt;
   entry.oldTail = journal.substr(kHeader, static_cast<std::size_t>(oldLength));
   entry.bytes = journal.substr(kHeader + static_cast<std::size_t>(oldLength),
                                static_cast<std::size_t>(length));

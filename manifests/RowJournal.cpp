@@ -22,15 +22,6 @@ namespace fs = std::filesystem;
 constexpr std::size_t kNumber = 8;
 constexpr std::string_view kSuffix = ".pending";
 
-std::uint64_t Checksum(std::string_view bytes) {
-  std::uint64_t hash = 14695981039346656037ull;
-  for (unsigned char c : bytes) {
-    hash ^= c;
-    hash *= 1099511628211ull;
-  }
-  return hash;
-}
-
 void PutNumber(std::string& out, std::uint64_t value) {
   for (std::size_t i = 0; i < kNumber; ++i)
     out.push_back(static_cast<char>((value >> (8 * i)) & 0xFF));
@@ -47,20 +38,8 @@ std::string Frame(std::string_view record) {
   std::string out;
   PutNumber(out, record.size());
   out += record;
-  PutNumber(out, Checksum(out));
+  PutNumber(out, Fnv1a(out));
   return out;
-}
-
-bool WriteAll(int fd, std::string_view bytes) {
-  while (!bytes.empty()) {
-    const ssize_t n = ::write(fd, bytes.data(), bytes.size());
-    if (n < 0) {
-      if (errno == EINTR) continue;
-      return false;
-    }
-    bytes.remove_prefix(static_cast<std::size_t>(n));
-  }
-  return true;
 }
 
 // Takes the journal's lock: waiting for it (the run's own journal) or only
@@ -100,17 +79,14 @@ bool RowJournal::Add(std::string_view record) {
     std::string name = (fs::path(folder_) / (Prefix(kind_) + "XXXXXX" + std::string(kSuffix))).string();
     const int fd = ::mkostemps(name.data(), static_cast<int>(kSuffix.size()), O_CLOEXEC);
     if (fd < 0) return false;
-    // Until it is locked, a new empty journal looks abandoned to another
-    // run, which may remove it: then it is made again.
-    struct stat held {};
-    struct stat named {};
     if (!LockJournal(fd, true)) {
       ::close(fd);
       ::unlink(name.c_str());
       return false;
     }
-    if (::fstat(fd, &held) != 0 || ::stat(name.c_str(), &named) != 0 ||
-        held.st_ino != named.st_ino || held.st_dev != named.st_dev) {
+    // Until it is locked, a new empty journal looks abandoned to another
+    // run, which may remove it: then it is made again.
+    if (!NamesOpenFile(name, fd)) {
       ::close(fd);
       continue;
     }
@@ -147,7 +123,7 @@ std::vector<std::string> RowJournal::Records(std::string_view bytes) {
     const std::uint64_t length = GetNumber(bytes, at);
     if (length > bytes.size() - at - 2 * kNumber) break;
     const std::size_t end = at + kNumber + static_cast<std::size_t>(length);
-    if (GetNumber(bytes, end) != Checksum(bytes.substr(at, end - at))) break;
+    if (GetNumber(bytes, end) != Fnv1a(bytes.substr(at, end - at))) break;
     records.emplace_back(bytes.substr(at + kNumber, static_cast<std::size_t>(length)));
     at = end + kNumber;
   }
@@ -168,12 +144,7 @@ int RowJournal::TakeAbandoned(const std::string& folder, const std::string& kind
     // A run that holds its journal is alive; the journal is still its own.
     // Once locked here, the name must still be this file: another run may
     // have moved it in and removed it meanwhile.
-    struct stat held {};
-    struct stat named {};
-    const bool ours = LockJournal(fd, false) && ::fstat(fd, &held) == 0 &&
-                      ::stat(path.c_str(), &named) == 0 && held.st_ino == named.st_ino &&
-                      held.st_dev == named.st_dev;
-    if (ours) {
+    if (LockJournal(fd, false) && NamesOpenFile(path, fd)) {
       const std::optional<std::string> bytes = ReadFile(path);
       if (bytes) {
         const std::vector<std::string> records = Records(*bytes);

@@ -1,11 +1,12 @@
 #include "platform/FileLock.h"
 
 #include <fcntl.h>
-#include <sys/stat.h>
 #include <unistd.h>
 
 #include <cerrno>
 #include <filesystem>
+
+#include "platform/FileSystem.h"
 
 namespace quendal {
 
@@ -52,10 +53,7 @@ bool FileLock::Acquire(const std::string& path) {
     }
     // The lock counts only while its file still has the name: the holder
     // before may have removed it while this call waited.
-    struct stat held {};
-    struct stat named {};
-    if (::fstat(fd, &held) == 0 && ::stat(lockPath.c_str(), &named) == 0 &&
-        held.st_dev == named.st_dev && held.st_ino == named.st_ino) {
+    if (NamesOpenFile(lockPath, fd)) {
       fd_ = fd;
       lockPath_ = lockPath;
       return true;

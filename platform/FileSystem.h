@@ -47,6 +47,13 @@ enum class NewFile { Written, Exists, Failed };
 NewFile WriteNewFile(const std::string& path, std::string_view bytes);
 std::optional<std::uintmax_t> FileSize(const std::string& path);
 
+// Writes all bytes to an open descriptor, going on after short or interrupted writes.
+bool WriteAll(int fd, std::string_view bytes);
+// FNV-1a over the bytes: how journals tell a whole record from one a crash tore.
+std::uint64_t Fnv1a(std::string_view bytes);
+// True while `path` still names the file open as `fd` (it was not removed or replaced).
+bool NamesOpenFile(const std::string& path, int fd);
+
 // What tells one state of a file from another: its identity, size and
 // modification time. A cache of a file's contents stays valid while the
 // stamp is unchanged.

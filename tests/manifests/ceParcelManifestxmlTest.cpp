@@ -13,6 +13,14 @@ constexpr std::string_view kManifestClass = "Quendal.clseParcelManifestxml";
 
 class eParcelManifestTest : public test::eParcelFixture {
  protected:
+  // The object's rows after Init and Load.
+  RowInterface* Loaded(const std::unique_ptr<Component>& object) {
+    auto* rows = as<RowInterface>(object);
+    Grid columns, grid;
+    rows->Init(host.system, 7, columns);
+    rows->Load("", grid);
+    return rows;
+  }
   // J SMITH, express; the delivery address has a phone and an e-mail.
   std::shared_ptr<test::MemoryObject<host::ConNote>> ExpressToJSmith(int packs = 1) {
     auto order = MakeOrder({{"Name", "J SMITH"},
@@ -246,10 +254,7 @@ TEST_F(eParcelManifestTest, AFileThatCannotBeWrittenIsReportedAndKeptForAnotherT
   auto prompt = std::make_shared<test::ScriptedPrompt>();  // answers Abort
   test::PromptScope scope(prompt);
   auto object = CreateObject(kManifestClass).object;
-  auto* rows = as<RowInterface>(object);
-  Grid columns, grid;
-  rows->Init(host.system, 7, columns);
-  rows->Load("", grid);
+  RowInterface* rows = Loaded(object);
   LogList log;
   ASSERT_EQ(rows->Process(0, log), 102);
   // The folder goes away before Term (the share dropped, say).
@@ -268,10 +273,7 @@ TEST_F(eParcelManifestTest, AConsignmentThatCannotBeKeptUntilTermIsNeitherStampe
   carrier->fields["FileFolder"] = Var(folder + "missing/");
   auto conNote = ExpressToJSmith();
   auto object = CreateObject(kManifestClass).object;
-  auto* rows = as<RowInterface>(object);
-  Grid columns, grid;
-  rows->Init(host.system, 7, columns);
-  rows->Load("", grid);
+  RowInterface* rows = Loaded(object);
   LogList log;
   EXPECT_EQ(rows->Process(0, log), 0);
   ASSERT_EQ(log.size(), 1u);
@@ -321,10 +323,7 @@ TEST_F(eParcelManifestTest, AConsignmentThatCannotBeReadLeavesNoDocumentBehind) 
 TEST_F(eParcelManifestTest, ARowProcessedTwiceIsInTheManifestOnce) {
   ExpressToJSmith();
   auto object = CreateObject(kManifestClass).object;
-  auto* rows = as<RowInterface>(object);
-  Grid columns, grid;
-  rows->Init(host.system, 7, columns);
-  rows->Load("", grid);
+  RowInterface* rows = Loaded(object);
   LogList log;
   EXPECT_EQ(rows->Process(0, log), 102);
   EXPECT_EQ(rows->Process(0, log), 0);

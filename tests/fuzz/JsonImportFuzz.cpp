@@ -8,6 +8,7 @@
 #include <cstdint>
 #include <cstdlib>
 #include <memory>
+#include <span>
 #include <string>
 #include <string_view>
 
@@ -52,7 +53,10 @@ void ReadBack(SqliteHost& host) {
           auto child = value.Object();
           if (!child || child->TypeName() != "Collection") continue;
           const std::int64_t count = child->Get("Count").Whole();
-          for (std::int64_t i = 1; i <= count && i <= 8; ++i) (void)child->Call("Item", {quendal::Var(i)});
+          for (std::int64_t i = 1; i <= count && i <= 8; ++i) {
+            const quendal::Var index(i);
+            (void)child->Call("Item", std::span<const quendal::Var>(&index, 1));
+          }
         } catch (const quendal::Error&) {
           // A member the host raises on (as an automation host would) is the
           // library's guard's business, not the import's.

@@ -317,8 +317,9 @@ ImportSummary SqliteHost::Import(std::string_view text) {
   json document;
   try {
     document = json::parse(text);
-  } catch (const json::parse_error& e) {
-    // The library's message starts with its own tag: "[json.exception.parse_error.101] ".
+  } catch (const json::exception& e) {
+    // A syntax error, or a number too large for a double ("1e999"). The library's
+    // message starts with its own tag: "[json.exception.parse_error.101] ".
     std::string message = e.what();
     if (auto end = message.find("] "); message.starts_with("[json.") && end != std::string::npos)
       message.erase(0, end + 2);

@@ -171,6 +171,8 @@ TEST(ImportTest, ARejectedDocumentNamesThePathAndLeavesTheDatabaseAsItWas) {
       {R"({"ConNotes": [{"ConNoteId": 5, "ConNoteDate": "1\u001b[31m\n"}]})",
        "ConNotes[0].ConNoteDate: malformed date \"1\\x1B[31m\\x0A\""},
       {"{\"Vendors\x7F\": []}", "Vendors\\x7F: unknown collection"},
+      {R"({"Packs": [{"PackId": 5, "Weight": 1e999}]})",
+       "invalid JSON: number overflow parsing '1e999'"},
       {R"([1, 2])", "(top level): expected an object, got an array"},
       {R"({"Widgets": []})", "Widgets: unknown collection"},
       {R"({"Vendors": {"VendorId": 5}})", "Vendors: expected an array, got an object"},

@@ -2,6 +2,7 @@
 
 #include <array>
 #include <cstdio>
+#include <algorithm>
 #include <set>
 
 #include "frame/Catalogue.h"
@@ -84,8 +85,6 @@ constexpr std::array kCartons = {
 };
 constexpr int kPallet = 3, kSatchel = 4;
 
-constexpr int kConsignments = 30;
-
 // The columns a site lists for each map-driven despatch advice, one field
 // name per line as a Windows editor saves them.
 struct MapFile {
@@ -124,7 +123,7 @@ std::string DemoSscc(std::int64_t serial) {
   return "00" + digits + std::to_string((10 - sum % 10) % 10);
 }
 
-DemoData BuildDemoData(const std::string& root, DateTime now) {
+DemoData BuildDemoData(const std::string& root, DateTime now, int consignments) {
   DemoData data;
   data.documentPrinter = "Despatch Office Laser";
   json& doc = data.document;
@@ -222,7 +221,9 @@ DemoData BuildDemoData(const std::string& root, DateTime now) {
   doc["ConNotes"] = json::array();
   doc["Packs"] = json::array();
   std::int64_t packId = 10001;
-  for (int i = 0; i < kConsignments; ++i) {
+  // A quarter of an hour apart, closer when a day of that many would run past 18:00.
+  const int spacing = std::min(15 * 60, 10 * 3600 / std::max(consignments, 1));
+  for (int i = 0; i < consignments; ++i) {
     // Every carrier twice, the last two consignments for the first carriers again.
     const int carrierIndex = i % carrierCount;
     const DemoCarrier& carrier = data.carriers[static_cast<std::size_t>(carrierIndex)];
@@ -237,7 +238,7 @@ DemoData BuildDemoData(const std::string& root, DateTime now) {
     const int packCount = 1 + (i * 7 + 3) % 9;
     const bool pallet = !postal && i % 5 == 1;
     const bool dangerous = i % 6 == 2;
-    const DateTime at = today.AddSeconds(8 * 3600 + i * 15 * 60);
+    const DateTime at = today.AddSeconds(8 * 3600 + i * spacing);
 
     doc["Despatches"].push_back({{"DespatchId", orderId}, {"DespatchNo", "PO" + Padded(778800 + i, 6)},
                                  {"NotBefore", Iso(today.AddDays(1).AddSeconds(8 * 3600))},

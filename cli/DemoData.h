@@ -37,7 +37,9 @@ struct DemoData {
 };
 
 // `root` is the demo folder (absolute); carrier folders lie under root/carriers/.
-DemoData BuildDemoData(const std::string& root, DateTime now);
+// `consignments` sets the size of the day (the demo's own is 30); however
+// many there are, they all fall between 08:00 and 18:00 of the same day.
+DemoData BuildDemoData(const std::string& root, DateTime now, int consignments = 30);
 
 // The SSCC "00" + extension digit, company prefix, serial and GS1 check digit.
 std::string DemoSscc(std::int64_t serial);

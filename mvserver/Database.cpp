@@ -73,6 +73,12 @@ Database::Database(const std::string& path) : path_(path) {
     db_ = nullptr;
     throw OpenError("cannot open database " + path + ": " + message);
   }
+  // Several packing stations share one database: with a write-ahead log their
+  // reads never wait for another station's write, and a write waits (up to the
+  // busy timeout) only for another write. The mode stays with the file; where
+  // it can't be had (a memory database, a file system without shared memory)
+  // the rollback journal serves, only slower.
+  sqlite3_exec(db_, "PRAGMA journal_mode = WAL", nullptr, nullptr, nullptr);
 }
 
 Database::~Database() {

@@ -41,8 +41,25 @@ std::string Describe(const json& value) {
   }
 }
 
+// Messages quote the document's own keys and values: control characters in
+// them are shown as \xNN, so a message stays one line that a terminal shows
+// as it is.
+std::string Printable(std::string_view text) {
+  std::string shown;
+  for (const char c : text) {
+    const auto byte = static_cast<unsigned char>(c);
+    if (byte >= 0x20 && byte != 0x7F) {
+      shown += c;
+      continue;
+    }
+    constexpr char kHex[] = "0123456789ABCDEF";
+    shown += {'\\', 'x', kHex[byte >> 4], kHex[byte & 0xF]};
+  }
+  return shown;
+}
+
 [[noreturn]] void Reject(const std::string& path, const std::string& message) {
-  throw ImportError(path + ": " + message);
+  throw ImportError(Printable(path + ": " + message));
 }
 
 bool FitsInteger(const json& value, std::int64_t low, std::int64_t high) {
@@ -108,7 +125,7 @@ struct PendingReference {
 
 class Importer {
  public:
-  Importer(SqliteHost& host) : host_(host), db_(host.Db()), model_(host.model()) {}
+  Importer(SqliteHost& host) : db_(host.Db()), model_(host.model()) {}
 
   ImportSummary Run(const json& document) {
     if (!document.is_object()) Reject("(top level)", "expected an object, got " + Describe(document));
@@ -203,7 +220,7 @@ class Importer {
           const int column = type.Column(key + "_" + name);
           const auto fields = AddressFields();
           const bool known = std::any_of(fields.begin(), fields.end(),
-                                         [&](const Field& f) { return f.name == name; });
+                                         [&field = name](const Field& f) { return f.name == field; });
           if (!known || column < 0) Reject(at + "." + name, "unknown field of Address");
           row[static_cast<std::size_t>(column)] = Convert(part, Value::Text, at + "." + name);
         }
@@ -287,7 +304,6 @@ class Importer {
     }
   }
 
-  SqliteHost& host_;
   Database& db_;
   Model& model_;
   std::vector<PendingReference> references_;
@@ -301,12 +317,13 @@ ImportSummary SqliteHost::Import(std::string_view text) {
   json document;
   try {
     document = json::parse(text);
-  } catch (const json::parse_error& e) {
-    // The library's message starts with its own tag: "[json.exception.parse_error.101] ".
+  } catch (const json::exception& e) {
+    // A syntax error, or a number too large for a double ("1e999"). The library's
+    // message starts with its own tag: "[json.exception.parse_error.101] ".
     std::string message = e.what();
     if (auto end = message.find("] "); message.starts_with("[json.") && end != std::string::npos)
       message.erase(0, end + 2);
-    throw ImportError("invalid JSON: " + message);
+    throw ImportError(Printable("invalid JSON: " + message));
   }
   ImportSummary summary;
   {

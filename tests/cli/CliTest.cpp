@@ -241,8 +241,9 @@ TEST_F(CliTest, GalleryDrawsEveryBuiltLabelClassAndRewritesOnlyItsBlock) {
   ASSERT_EQ(r.status, 0) << r.err;
   std::size_t built = 0;
   for (const auto& entry : Catalogue()) built += entry.family == Family::Label && entry.factory ? 1 : 0;
-  ASSERT_EQ(r.Json()["pictures"].size(), built) << r.out;
-  for (const auto& picture : r.Json()["pictures"])
+  const json pictures = r.Json()["pictures"];
+  ASSERT_EQ(pictures.size(), built) << r.out;
+  for (const auto& picture : pictures)
     EXPECT_TRUE(test::ReadText(folder / picture["file"].get<std::string>()).starts_with("\x89PNG")) << picture;
   const std::string readme = test::ReadText(folder / "README.md");
   EXPECT_TRUE(readme.starts_with("# Labels\nSee `<!-- gallery -->` below.\n<!-- gallery -->\n")) << readme;

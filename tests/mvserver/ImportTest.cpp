@@ -164,6 +164,15 @@ TEST(ImportTest, ASecondDocumentAddsToTheDatabaseAndMayReferToItsRecords) {
 TEST(ImportTest, ARejectedDocumentNamesThePathAndLeavesTheDatabaseAsItWas) {
   const std::pair<const char*, const char*> cases[] = {
       {R"({"Vendors": [)", "invalid JSON: "},
+      // What the document holds is quoted with its control characters escaped.
+      {"{\"Vendors\": [\x7F",
+       "invalid JSON: parse error at line 1, column 14: syntax error while parsing value - invalid "
+       "literal; last read: '\"Vendors\": [\\x7F'"},
+      {R"({"ConNotes": [{"ConNoteId": 5, "ConNoteDate": "1\u001b[31m\n"}]})",
+       "ConNotes[0].ConNoteDate: malformed date \"1\\x1B[31m\\x0A\""},
+      {"{\"Vendors\x7F\": []}", "Vendors\\x7F: unknown collection"},
+      {R"({"Packs": [{"PackId": 5, "Weight": 1e999}]})",
+       "invalid JSON: number overflow parsing '1e999'"},
       {R"([1, 2])", "(top level): expected an object, got an array"},
       {R"({"Widgets": []})", "Widgets: unknown collection"},
       {R"({"Vendors": {"VendorId": 5}})", "Vendors: expected an array, got an object"},

@@ -1,5 +1,6 @@
 #include "mvserver/SqliteHost.h"
 
+#include <chrono>
 #include <gtest/gtest.h>
 
 #include "tests/support/TempFolder.h"
@@ -184,6 +185,28 @@ TEST_F(SqliteHostTest, LogEntriesGetIdsFromOneAndBindByID) {
   ASSERT_EQ(host->LogsSince(1).size(), 1u);
   EXPECT_EQ(host->LogsSince(1)[0]->Message().Text(), "second");
   EXPECT_EQ(host->LastLogId(), 2);
+}
+
+// Packing stations share one database: one station in the middle of a read
+// (a row run listing the day) must not hold up another station's write, and
+// the entries both write get ids of their own.
+TEST_F(SqliteHostTest, AStationsReadNeverHoldsUpAnotherStationsWrite) {
+  auto other = SqliteHost::Open(folder / "host.db");
+  auto save = [](SqliteHost& station, const char* message) {
+    auto log = station.NewLog();
+    log->SetMessage(message);
+    log->Save();
+    return log->LogId().Whole();
+  };
+  host->Db().Exec("BEGIN; SELECT count(*) FROM ConNotes;");
+  const auto start = std::chrono::steady_clock::now();
+  EXPECT_EQ(save(*other, "station 2"), 1);
+  EXPECT_LT(std::chrono::steady_clock::now() - start, std::chrono::seconds(1));
+  host->Db().Exec("COMMIT");
+  EXPECT_EQ(save(*host, "station 1"), 2);
+  EXPECT_EQ(save(*other, "station 2 again"), 3);
+  ASSERT_EQ(host->LogsSince(0).size(), 3u);
+  EXPECT_EQ(host->LogsSince(0)[2]->Message().Text(), "station 2 again");
 }
 
 TEST_F(SqliteHostTest, ReceiverLoadFindsByCodeAndPartnerWithoutRenamingTheLastOne) {

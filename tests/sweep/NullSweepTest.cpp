@@ -96,10 +96,11 @@ const std::vector<std::string>& HostileTexts() {
 }
 
 // Settings rather than texts: folders and printers say where output goes,
-// option codes and the language what is printed.
+// option codes, the service level and the language what is printed.
 bool IsSetting(const MemberKey& key) {
   return key.member == "FileFolder" || key.member == "OutputFolder" || key.member == "DocumentPrinter" ||
-         key.member == "PrinterLanguage" || key.member == "Options" || key.member == "NotifyOptions";
+         key.member == "PrinterLanguage" || key.member == "Options" || key.member == "NotifyOptions" ||
+         key.member == "ServiceLevel";
 }
 
 void TextSweep(Family family, const char* name) {

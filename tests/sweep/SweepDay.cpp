@@ -40,8 +40,8 @@ void Spill(const fs::path& path, const std::string& bytes) {
 FileMap Snapshot(const fs::path& folder) {
   FileMap files;
   std::error_code ec;
-  for (auto it = fs::recursive_directory_iterator(folder, ec); !ec && it != fs::recursive_directory_iterator();
-       it.increment(ec)) {
+  for (auto it = fs::recursive_directory_iterator(folder, ec);
+       !ec && it != fs::recursive_directory_iterator(); it.increment(ec)) {
     if (!it->is_regular_file(ec)) continue;
     const std::string relative = fs::relative(it->path(), folder, ec).string();
     if (relative.starts_with("host.db")) continue;
@@ -73,8 +73,10 @@ std::size_t Columns(const std::string& line, char delimiter) {
   std::size_t columns = 1;
   bool quoted = false;
   for (char c : line) {
-    if (c == '"') quoted = !quoted;
-    else if (c == delimiter && !quoted) ++columns;
+    if (c == '"')
+      quoted = !quoted;
+    else if (c == delimiter && !quoted)
+      ++columns;
   }
   return columns;
 }
@@ -82,9 +84,10 @@ std::size_t Columns(const std::string& line, char delimiter) {
 // How a carrier file is built, learnt from the clean run's copy of it.
 struct FileShape {
   bool xml = false;
-  char delimiter = 0;               // a delimited file: every line has `columns` columns
+  char delimiter = 0;  // a delimited file: every line has `columns` columns
   std::size_t columns = 0;
-  std::map<std::string, std::size_t> widths;  // a fixed-width file: record width by its first two characters
+  std::map<std::string, std::size_t>
+      widths;  // a fixed-width file: record width by its first two characters
   std::map<std::string, std::size_t> fields;  // a tagged file: "|"-separated fields by record tag
 };
 
@@ -126,7 +129,8 @@ FileShape ShapeOf(const std::string& path, const std::string& text) {
   return shape;
 }
 
-std::vector<std::string> FileFaults(const std::string& path, const std::string& text, const FileShape& shape) {
+std::vector<std::string> FileFaults(const std::string& path, const std::string& text,
+                                    const FileShape& shape) {
   std::vector<std::string> faults;
   if (shape.xml) {
     pugi::xml_document doc;
@@ -134,19 +138,23 @@ std::vector<std::string> FileFaults(const std::string& path, const std::string& 
     if (!parsed) faults.push_back(path + ": not well-formed XML (" + parsed.description() + ")");
     return faults;
   }
-  if (!text.empty() && !text.ends_with("\r\n")) faults.push_back(path + ": the last record is not whole");
+  if (!text.empty() && !text.ends_with("\r\n"))
+    faults.push_back(path + ": the last record is not whole");
   int line = 0;
   for (const auto& l : Lines(text)) {
     ++line;
     if (l.find_first_of("\r\n") != std::string::npos)
-      faults.push_back(path + " line " + std::to_string(line) + ": a bare line break inside a record");
+      faults.push_back(path + " line " + std::to_string(line) +
+                       ": a bare line break inside a record");
     if (shape.delimiter && Columns(l, shape.delimiter) != shape.columns)
-      faults.push_back(path + " line " + std::to_string(line) + ": " + std::to_string(Columns(l, shape.delimiter)) +
-                       " columns, not " + std::to_string(shape.columns));
+      faults.push_back(path + " line " + std::to_string(line) + ": " +
+                       std::to_string(Columns(l, shape.delimiter)) + " columns, not " +
+                       std::to_string(shape.columns));
     if (auto tagged = shape.fields.find(l.substr(0, 2)); tagged != shape.fields.end()) {
       if (Columns(l, '|') != tagged->second)
-        faults.push_back(path + " line " + std::to_string(line) + ": record " + tagged->first + " has " +
-                         std::to_string(Columns(l, '|')) + " fields, not " + std::to_string(tagged->second));
+        faults.push_back(path + " line " + std::to_string(line) + ": record " + tagged->first +
+                         " has " + std::to_string(Columns(l, '|')) + " fields, not " +
+                         std::to_string(tagged->second));
     } else if (!shape.delimiter) {
       auto it = shape.widths.find(l.substr(0, 2));
       // Values are never cut, so an over-long one lengthens its record; a
@@ -246,24 +254,28 @@ SweepDay::SweepDay() {
     if (!day.folder.ends_with("/")) day.folder += "/";
     printers_.push_back(c.printer);
     // Carrier folders exist (empty) in every run, the map files beside them.
-    day_.files[std::string(kRootBelowRun) + "/" + fs::path(c.outputFolder).lexically_relative(kDataRoot).string() +
-               "/.keep"] = "";
+    day_.files[std::string(kRootBelowRun) + "/" +
+               fs::path(c.outputFolder).lexically_relative(kDataRoot).string() + "/.keep"] = "";
     day_.files[std::string(kRootBelowRun) + "/" + day.folder + ".keep"] = "";
   }
   for (const auto& f : data.files)
-    day_.files[std::string(kRootBelowRun) + "/" + fs::path(f.path).lexically_relative(kDataRoot).string()] = f.text;
+    day_.files[std::string(kRootBelowRun) + "/" +
+               fs::path(f.path).lexically_relative(kDataRoot).string()] = f.text;
   printers_.push_back(data.documentPrinter);
 }
 
 SweepDay::~SweepDay() {
   SetNow(std::nullopt);
-  if (previousConfig_.empty()) unsetenv("XDG_CONFIG_HOME");
-  else setenv("XDG_CONFIG_HOME", previousConfig_.c_str(), 1);
+  if (previousConfig_.empty())
+    unsetenv("XDG_CONFIG_HOME");
+  else
+    setenv("XDG_CONFIG_HOME", previousConfig_.c_str(), 1);
 }
 
 std::string SweepDay::CarrierFolder(const CatalogueEntry& entry) const {
   auto it = carriers_.find(std::string(entry.carrier));
-  return it == carriers_.end() ? std::string() : std::string(kRootBelowRun) + "/" + it->second.folder;
+  return it == carriers_.end() ? std::string()
+                               : std::string(kRootBelowRun) + "/" + it->second.folder;
 }
 
 const SweepDay::Seed& SweepDay::SeedOf(const CatalogueEntry& entry) {
@@ -297,7 +309,8 @@ Outcome SweepDay::RunIn(const CatalogueEntry& entry, Sweep& sweep, const Seed& s
   sweep.MoveRoot(kDataRoot, (run / kRootBelowRun).string());
 
   const std::string carrierName(entry.carrier);
-  const CarrierDay& carrier = carriers_.count(carrierName) ? carriers_.at(carrierName) : carriers_.begin()->second;
+  const CarrierDay& carrier =
+      carriers_.count(carrierName) ? carriers_.at(carrierName) : carriers_.begin()->second;
   const std::int64_t conNoteId = second ? carrier.conNotes.back() : carrier.conNotes.front();
 
   auto host = mvserver::SqliteHost::Open((run / "host.db").string());
@@ -322,7 +335,8 @@ Outcome SweepDay::RunIn(const CatalogueEntry& entry, Sweep& sweep, const Seed& s
         labels->PrintLabel(sweep.Wrap(firstPack));
       } else if (auto* consignment = as<ConsignmentInterface>(created.object)) {
         LogList vtErrorLog;
-        consignment->Process(system, sweep.Wrap(conNote), sweep.Wrap(firstPack ? firstPack->ASN() : Ref<host::ASN>()),
+        consignment->Process(system, sweep.Wrap(conNote),
+                             sweep.Wrap(firstPack ? firstPack->ASN() : Ref<host::ASN>()),
                              sweep.Wrap(packs), vtErrorLog);
         consignment->Term();
       } else if (auto* rows = as<RowInterface>(created.object)) {
@@ -330,7 +344,8 @@ Outcome SweepDay::RunIn(const CatalogueEntry& entry, Sweep& sweep, const Seed& s
         LogList vtErrorLog;
         rows->Init(system, carrier.ediDocument, columns);
         rows->Load({}, grid);
-        for (std::size_t r = 0; r < grid.Rows(); ++r) rows->Process(static_cast<std::int32_t>(r), vtErrorLog);
+        for (std::size_t r = 0; r < grid.Rows(); ++r)
+          rows->Process(static_cast<std::int32_t>(r), vtErrorLog);
         rows->Term();
       }
     } catch (const std::exception& e) {
@@ -351,8 +366,8 @@ Outcome SweepDay::RunIn(const CatalogueEntry& entry, Sweep& sweep, const Seed& s
   return outcome;
 }
 
-std::vector<std::string> SweepDay::Check(const CatalogueEntry& entry, const Outcome& clean, const Outcome& run,
-                                         bool sameShape) const {
+std::vector<std::string> SweepDay::Check(const CatalogueEntry& entry, const Outcome& clean,
+                                         const Outcome& run, bool sameShape) const {
   std::vector<std::string> faults;
   if (!run.escaped.empty()) faults.push_back("escaped to the host: " + Printable(run.escaped));
   const std::string folder = CarrierFolder(entry);
@@ -367,13 +382,16 @@ std::vector<std::string> SweepDay::Check(const CatalogueEntry& entry, const Outc
     // files with a trailer are rewritten).
     if (seed != seeds_.end())
       if (auto before = seed->second.files.find(path); before != seed->second.files.end())
-        if (auto after = clean.files.find(path); after != clean.files.end() && after->second.starts_with(before->second))
-          if (!text.starts_with(before->second)) faults.push_back(path + ": what the file held was changed");
+        if (auto after = clean.files.find(path);
+            after != clean.files.end() && after->second.starts_with(before->second))
+          if (!text.starts_with(before->second))
+            faults.push_back(path + ": what the file held was changed");
     // The clean run's file of the same kind gives the shape.
     const std::string* model = nullptr;
     if (auto same = clean.files.find(path); same != clean.files.end()) model = &same->second;
     for (const auto& [cleanPath, cleanText] : clean.files)
-      if (!model && Extension(cleanPath) == Extension(path) && cleanPath.starts_with(folder)) model = &cleanText;
+      if (!model && Extension(cleanPath) == Extension(path) && cleanPath.starts_with(folder))
+        model = &cleanText;
     if (!model) continue;
     for (auto& f : FileFaults(path, text, ShapeOf(path, *model))) faults.push_back(Printable(f));
   }
@@ -385,7 +403,8 @@ std::vector<std::string> SweepDay::Check(const CatalogueEntry& entry, const Outc
       // Label streams only: printed documents are PDF pages.
       const std::string& model = clean.jobs[i].bytes;
       if (model.starts_with("%PDF") || !(IsVpcl(model) || IsZpl(model))) continue;
-      const std::string before = StreamShape(clean.jobs[i].bytes), after = StreamShape(run.jobs[i].bytes);
+      const std::string before = StreamShape(clean.jobs[i].bytes),
+                        after = StreamShape(run.jobs[i].bytes);
       if (before == after) continue;
       std::size_t at = 0;
       while (at < before.size() && at < after.size() && before[at] == after[at]) ++at;

@@ -39,8 +39,8 @@ class SweepDay {
 
   // What is wrong with a run, judged against the clean run of the same class;
   // `sameShape` also wants every printer stream to keep the clean run's structure.
-  std::vector<std::string> Check(const CatalogueEntry& entry, const Outcome& clean, const Outcome& run,
-                                 bool sameShape) const;
+  std::vector<std::string> Check(const CatalogueEntry& entry, const Outcome& clean,
+                                 const Outcome& run, bool sameShape) const;
 
  private:
   struct Seed {

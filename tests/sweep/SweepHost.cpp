@@ -21,8 +21,12 @@ class Proxy final : public T, public ProxyBase {
       : inner_(std::move(inner)), sweep_(sweep), label_(std::move(label)) {}
   const std::shared_ptr<host::Object>& Inner() const override { return inner_; }
   std::string_view TypeName() const override { return inner_->TypeName(); }
-  Var Get(std::string_view member) override { return sweep_.OnRead(label_, member, inner_->Get(member)); }
-  void Set(std::string_view member, const Var& value) override { inner_->Set(member, Sweep::Unwrap(value)); }
+  Var Get(std::string_view member) override {
+    return sweep_.OnRead(label_, member, inner_->Get(member));
+  }
+  void Set(std::string_view member, const Var& value) override {
+    inner_->Set(member, Sweep::Unwrap(value));
+  }
   Var Call(std::string_view method, std::span<const Var> args) override {
     std::vector<Var> plain;
     plain.reserve(args.size());
@@ -41,8 +45,8 @@ template <class T>
 bool TryProxy(const std::shared_ptr<host::Object>& object, Sweep& sweep, std::string_view label,
               std::shared_ptr<host::Object>& out) {
   if (out || !dynamic_cast<T*>(object.get())) return false;
-  out = std::make_shared<Proxy<T>>(object, sweep,
-                                   label.empty() ? std::string(object->TypeName()) : std::string(label));
+  out = std::make_shared<Proxy<T>>(
+      object, sweep, label.empty() ? std::string(object->TypeName()) : std::string(label));
   return true;
 }
 
@@ -86,20 +90,22 @@ std::shared_ptr<host::Object> Sweep::Wrap(const std::shared_ptr<host::Object>& o
   using namespace host;
   std::shared_ptr<Object> p;
   // Collections first, each under a name of its own: they share one type name.
-  TryProxy<ConNotes>(object, *this, "ConNotes", p) || TryProxy<PackList>(object, *this, "PackList", p) ||
-      TryProxy<PackLines>(object, *this, "PackLines", p) || TryProxy<SlipLines>(object, *this, "SlipLines", p) ||
+  TryProxy<ConNotes>(object, *this, "ConNotes", p) ||
+      TryProxy<PackList>(object, *this, "PackList", p) ||
+      TryProxy<PackLines>(object, *this, "PackLines", p) ||
+      TryProxy<SlipLines>(object, *this, "SlipLines", p) ||
       TryProxy<Orders>(object, *this, "Orders", p) ||
-      TryProxy<Collection<ConNote>>(object, *this, "ConNoteList", p) || TryProxy<System>(object, *this, {}, p) ||
-      TryProxy<ConNote>(object, *this, {}, p) || TryProxy<ASN>(object, *this, {}, p) ||
-      TryProxy<Pack>(object, *this, {}, p) || TryProxy<PackLine>(object, *this, {}, p) ||
-      TryProxy<Product>(object, *this, {}, p) || TryProxy<Order>(object, *this, {}, p) ||
-      TryProxy<PSlipLine>(object, *this, {}, p) || TryProxy<Customer>(object, *this, {}, p) ||
-      TryProxy<Address>(object, *this, {}, p) || TryProxy<Despatch>(object, *this, {}, p) ||
-      TryProxy<Carton>(object, *this, {}, p) || TryProxy<Receiver>(object, *this, {}, p) ||
-      TryProxy<Vendor>(object, *this, {}, p) || TryProxy<Carrier>(object, *this, {}, p) ||
-      TryProxy<Partner>(object, *this, {}, p) || TryProxy<Job>(object, *this, {}, p) ||
-      TryProxy<EDIDocument>(object, *this, {}, p) || TryProxy<Manifest>(object, *this, {}, p) ||
-      TryProxy<Log>(object, *this, {}, p);
+      TryProxy<Collection<ConNote>>(object, *this, "ConNoteList", p) ||
+      TryProxy<System>(object, *this, {}, p) || TryProxy<ConNote>(object, *this, {}, p) ||
+      TryProxy<ASN>(object, *this, {}, p) || TryProxy<Pack>(object, *this, {}, p) ||
+      TryProxy<PackLine>(object, *this, {}, p) || TryProxy<Product>(object, *this, {}, p) ||
+      TryProxy<Order>(object, *this, {}, p) || TryProxy<PSlipLine>(object, *this, {}, p) ||
+      TryProxy<Customer>(object, *this, {}, p) || TryProxy<Address>(object, *this, {}, p) ||
+      TryProxy<Despatch>(object, *this, {}, p) || TryProxy<Carton>(object, *this, {}, p) ||
+      TryProxy<Receiver>(object, *this, {}, p) || TryProxy<Vendor>(object, *this, {}, p) ||
+      TryProxy<Carrier>(object, *this, {}, p) || TryProxy<Partner>(object, *this, {}, p) ||
+      TryProxy<Job>(object, *this, {}, p) || TryProxy<EDIDocument>(object, *this, {}, p) ||
+      TryProxy<Manifest>(object, *this, {}, p) || TryProxy<Log>(object, *this, {}, p);
   if (!p) return object;  // a type the sweep does not know passes unwatched
   proxies_.emplace(object.get(), p);
   return p;

@@ -82,7 +82,8 @@ class Sweep {
 // out behind the sweep's proxies.
 class SweepLibrary : public host::Library {
  public:
-  SweepLibrary(std::shared_ptr<host::Library> inner, Sweep& sweep) : inner_(std::move(inner)), sweep_(sweep) {}
+  SweepLibrary(std::shared_ptr<host::Library> inner, Sweep& sweep)
+      : inner_(std::move(inner)), sweep_(sweep) {}
   Ref<host::Log> NewLog() override { return sweep_.Wrap(inner_->NewLog()); }
   Ref<host::Receiver> NewReceiver() override { return sweep_.Wrap(inner_->NewReceiver()); }
   Ref<host::Vendor> NewVendor() override { return sweep_.Wrap(inner_->NewVendor()); }

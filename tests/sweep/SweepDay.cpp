@@ -25,16 +25,11 @@ constexpr const char* kDataRoot = "/quendal-sweep-day";
 // that climbs out of a carrier folder with ".." still lands where it is seen.
 constexpr const char* kRootBelowRun = "up1/up2/day";
 
-std::string Slurp(const fs::path& path) {
-  std::ifstream in(path, std::ios::binary);
-  std::ostringstream out;
-  out << in.rdbuf();
-  return out.str();
-}
+std::string Slurp(const fs::path& path) { return ReadText(path.string()); }
 
 void Spill(const fs::path& path, const std::string& bytes) {
   fs::create_directories(path.parent_path());
-  std::ofstream(path, std::ios::binary) << bytes;
+  WriteText(path.string(), bytes);
 }
 
 FileMap Snapshot(const fs::path& folder) {

@@ -86,10 +86,11 @@ constexpr std::array kDangerousGoods = {
 };
 static_assert(Width(kDangerousGoods) == 150);
 
-// Item "20": the pack's SSCC as it is, then its handling tail.
+// Item "20": the pack's SSCC, then its handling tail. An SSCC is 20
+// characters; a missing one is spaces, so the tail keeps its place.
 constexpr std::array kItem = {
     Literal("20"), TextLeft(20),  // consignment number
-    TextLeft(0),                  // SSCC
+    TextLeft(20),                 // SSCC
     TextLeft(0),                  // "S " alone, "B PAL" or "S " + unit
 };
 

@@ -310,7 +310,8 @@ bool ClnWriter::Write(Procedure& proc, const ClnConsignment& c,
   if (!proc([&] { owner_.LogLine(0, kProcess, "ConNote " + no + " compile Started."); })) return false;
 
   const std::string header = records;  // a retried step starts again from here
-  const std::int32_t packCount = lstPacks ? lstPacks->Count() : 0;
+  std::int32_t packCount = 0;
+  if (!proc([&] { packCount = lstPacks ? lstPacks->Count() : 0; })) return false;
   if (!proc([&] {
         const ReceiverBlock r = Receiver(objConNote);
         const std::string service = objConNote->Service().Text();

@@ -110,15 +110,17 @@ std::string ShownText(std::string_view text) {
 }
 
 void AppendCsvValue(std::string& line, std::string_view value, char delimiter) {
-  if (value.find(delimiter) == std::string_view::npos &&
-      value.find_first_of("\"\r\n") == std::string_view::npos) {
-    line.append(value);
+  // A line break would split the record for a carrier that reads line by
+  // line, quoted or not: it becomes a space, as in fixed-width records.
+  auto put = [&line](char c) { line += c == '\r' || c == '\n' ? ' ' : c; };
+  if (value.find(delimiter) == std::string_view::npos && value.find('"') == std::string_view::npos) {
+    for (char c : value) put(c);
     return;
   }
   line += '"';
   for (char c : value) {
     if (c == '"') line += '"';
-    line += c;
+    put(c);
   }
   line += '"';
 }

@@ -51,8 +51,8 @@ std::vector<std::string_view> SplitLines(std::string_view text);
 std::string ShownText(std::string_view text);
 
 // Appends one value to a delimited line: as it stands, or in double quotes
-// with each quote doubled when it holds the delimiter, a double quote or a
-// line break, so that it stays one column.
+// with each quote doubled when it holds the delimiter or a double quote, so
+// that it stays one column. Line breaks become spaces: a record is one line.
 void AppendCsvValue(std::string& line, std::string_view value, char delimiter = ',');
 
 }  // namespace quendal

@@ -80,7 +80,11 @@ std::string Render(std::span<const Field> layout, std::span<const Var> values) {
       line += Fill(field, Var());
       continue;
     }
-    line += Fill(field, next != values.end() ? *next++ : Var());
+    std::string text = Fill(field, next != values.end() ? *next++ : Var());
+    // A missing date or number keeps its place in the record as spaces.
+    if (text.empty() && (field.kind == Kind::Date || field.kind == Kind::Number))
+      text = quendal::Spaces(field.width);
+    line += text;
   }
   return line;
 }

@@ -30,7 +30,7 @@ enum class Kind : std::uint8_t {
   CutLeft,    // the first `width` characters of the value, padded on the right
   CutRight,   // the first `width` characters of the value, padded on the left
   Zero,       // the value as a whole number, zero-filled on the left to `width` digits
-  Date,       // the value formatted with the mask; a missing date is empty
+  Date,       // the value formatted with the mask; a missing date is spaces in a fixed record
   Number,     // the number formatted with the mask ("00000.000")
 };
 
@@ -74,7 +74,8 @@ constexpr int Width(std::span<const Field> layout) {
   return width;
 }
 
-// The line (UTF-8, without line ending). Null reads as the empty text;
+// The line (UTF-8, without line ending). Null reads as the empty text, and a
+// missing date or number is written as spaces of its field's width;
 // values missing at the end of the list read as Null. Control characters
 // in values (line breaks, tabs) become spaces: a value must never split or
 // skew a record.

@@ -50,7 +50,8 @@ void clsAlliedExpressSEDIP::Compile(const Ref<host::ConNote>& objConNote,
     return;
 
   const DateTime now = Now();
-  const std::int32_t packCount = lstPacks ? lstPacks->Count() : 0;
+  std::int32_t packCount = 0;
+  if (!proc([&] { packCount = lstPacks ? lstPacks->Count() : 0; })) return;
   std::string file;
   if (!proc([&] {
         const Ref<host::Receiver> r = objConNote->Receiver();

@@ -120,7 +120,8 @@ void clsVicExpressDAcln::Compile(const Ref<host::ConNote>& objConNote, const Ref
 
   // The consignment record goes with the first pack, so a consignment
   // without packs writes nothing of its own.
-  const std::int32_t packCount = lstPacks ? lstPacks->Count() : 0;
+  std::int32_t packCount = 0;
+  if (!proc([&] { packCount = lstPacks ? lstPacks->Count() : 0; })) return;
   for (std::int32_t i = 1; i <= packCount; ++i) {
     if (!proc([&] {
           const Ref<host::Pack> pack = lstPacks->Item(i);

@@ -165,15 +165,19 @@ TEST_F(ConsignmentWriterTest, TotalShipmentWeightPrefersTheCartonWeight) {
   EXPECT_DOUBLE_EQ(probe.TotalShipmentWeight(nullptr), 0);
 }
 
-TEST(FixedRecordTest, FieldsPadButNeverCutUnlessAsked) {
+TEST(FixedRecordTest, FieldsPadButNeverCutUnlessAskedAndMissingDatesKeepTheirWidth) {
   using namespace record;
   constexpr std::array layout = {Literal("15"), TextLeft(5), TextRight(4), CutLeft(3), Zero(4),
                                  Date("YYYYMMDD"), Spaces(2)};
   static_assert(Width(layout) == 28);
   EXPECT_EQ(Render(layout, {"AB", 7, "ABCDEF", 12.5, DateTime::FromParts(2024, 3, 14)}),
             "15AB      7ABC001220240314  ");
-  EXPECT_EQ(Render(layout, {"ABCDEFG", "12345", "é", Var(), Var()}), "15ABCDEFG12345é  0000  ");
-  EXPECT_EQ(Render(layout, {"a\tb\r\nc"}), "15a b  c       0000  ");
+  EXPECT_EQ(Render(layout, {"ABCDEFG", "12345", "é", Var(), Var()}), "15ABCDEFG12345é  0000          ");
+  EXPECT_EQ(Render(layout, {"a\tb\r\nc"}), "15a b  c       0000          ");
+  constexpr std::array number = {Literal("W"), Number("0000.00"), Date("DD/MM/YYYY")};
+  EXPECT_EQ(Render(number, {Var(), Var()}), "W" + std::string(17, ' '));
+  // A delimited record leaves a missing date empty.
+  EXPECT_EQ(RenderDelimited(number, std::vector<Var>{1.5, Var()}, ','), "W,0001.50,");
 }
 
 }  // namespace

@@ -60,14 +60,17 @@ TEST(CsvMapTest, LinesThatNameNoFieldKeepTheirColumnAndAreNotedOnce) {
   EXPECT_EQ(flood.notes[10], "490 more lines name no field; their columns are written empty.");
 }
 
-TEST(CsvMapTest, OnlyValuesThatWouldSplitTheLineAreQuoted) {
+TEST(CsvMapTest, OnlyValuesThatWouldSplitTheColumnAreQuotedAndLineBreaksAreSpaces) {
   std::string line;
   for (std::string_view value :
        {"plain", "", "a,b", "say \"hi\"", "two\nlines", "cr\r", "tab\there"}) {
     if (!line.empty()) line += ',';
     AppendCsvValue(line, value);
   }
-  EXPECT_EQ(line, "plain,,\"a,b\",\"say \"\"hi\"\"\",\"two\nlines\",\"cr\r\",tab\there");
+  EXPECT_EQ(line, "plain,,\"a,b\",\"say \"\"hi\"\"\",two lines,cr ,tab\there");
+  line.clear();
+  AppendCsvValue(line, "a,\r\nb");
+  EXPECT_EQ(line, "\"a,  b\"");
 }
 
 }  // namespace

@@ -475,7 +475,8 @@ TEST_F(StarTrackDAclnTest, NamesFromHostTextsStayInsideTheFolder) {
 }
 
 TEST_F(StarTrackDAclnTest, NullHostDataDoesNotStopTheFile) {
-  // A consignment whose every value is missing still gets its records.
+  // A consignment whose every value is missing still gets its records, each
+  // of its full width: missing dates and the SSCC are spaces.
   auto bare = host.Make<host::ConNote>({{"Carrier", carrier}});
   auto pack = host.Make<host::Pack>();
   MemoryHost::Attach(bare, {pack});
@@ -485,14 +486,14 @@ TEST_F(StarTrackDAclnTest, NullHostDataDoesNotStopTheFile) {
   const std::string name = "SRX.CLN";
   const std::string blank20 = Sp(20);
   EXPECT_EQ(File("SRX.CLN"),
-            "00N" + Pad(name, 12) + "G" + Sp(20) + "Y" + Sp(71) + "\r\n" + "10" + blank20 + Sp(8) +
+            "00N" + Pad(name, 12) + Sp(14) + "G" + Sp(20) + Sp(14) + "Y" + Sp(71) + "\r\n" + "10" + blank20 + Sp(8) +
                 Sp(40) + Sp(40) + Sp(40) + Sp(40) + Sp(30) + " " + Sp(4) + Sp(17) + "N" +
                 "10293847" + "S" + "   1" + "EXP" + Sp(5) + "    0" + Sp(4) + "N" + Sp(4) +
-                "CTN\r\n" + "13" + blank20 + "Not Before: " + "Not After: " + Sp(25) + "\r\n" +
+                "CTN\r\n" + "13" + blank20 + "Not Before: " + Sp(13) + "Not After: " + Sp(14) + Sp(25) + Sp(24) + "\r\n" +
                 "15" + blank20 + "S" + blank20 + "Senders Reference             Y\r\n" + "15" +
                 blank20 + "F" + blank20 + "Advance Ship Notice Number    Y\r\n" + "15" + blank20 +
                 "B" + blank20 + "Customer Order Number         Y\r\n" + "20" + blank20 +
-                "S CTN\r\n");
+                blank20 + "S CTN\r\n");
   EXPECT_EQ(host.LogMessages().back(), "ConNote  compile completed.");
 
   // Nothing at all: no carrier, no packs, no notice.

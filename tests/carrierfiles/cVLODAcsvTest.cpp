@@ -124,7 +124,7 @@ TEST_F(VLODAcsvTest, WithoutAMapNothingIsWrittenUntilTheMapIsThere) {
   EXPECT_EQ(Output(), CsvLine({kCsvSscc[0]}));
 }
 
-TEST_F(VLODAcsvTest, AValueHoldingACommaOrQuoteStaysOneColumn) {
+TEST_F(VLODAcsvTest, AValueHoldingACommaOrQuoteStaysOneColumnAndALineBreakIsASpace) {
   Map("VLODA.map", "RECEIVERNAME\r\nCONTAINERNO\r\nRECEIVERTOWN");
   receiver->fields["Name"] = "  Smith, Jones & Co  ";
   receiver->fields["Suburb"] = "Line one\r\nline two";
@@ -132,7 +132,7 @@ TEST_F(VLODAcsvTest, AValueHoldingACommaOrQuoteStaysOneColumn) {
   receiver->fields["Name"] = "The \"Corner\" Store";
   receiver->fields["Suburb"] = "TRUGANINA";
   Process(vlo, ConNote("VLO00012346", 1));
-  EXPECT_EQ(Output(), CsvLine({"\"Smith, Jones & Co\"", kCsvSscc[0], "\"Line one\r\nline two\""}) +
+  EXPECT_EQ(Output(), CsvLine({"\"Smith, Jones & Co\"", kCsvSscc[0], "Line one  line two"}) +
                           CsvLine({"\"The \"\"Corner\"\" Store\"", kCsvSscc[0], "TRUGANINA"}));
 }
 

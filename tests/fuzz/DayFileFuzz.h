@@ -1,0 +1,68 @@
+// What the targets that reopen a day file share: a carrier folder of the
+// process's own under TMPDIR (/dev/shm spares the disk the flushes),
+// emptied before each input, the input written into it as
+// the day file, and a prompt that counts the error reports instead of
+// asking anyone.
+#pragma once
+
+#include <unistd.h>
+
+#include <cstdlib>
+#include <filesystem>
+#include <memory>
+#include <string>
+#include <string_view>
+
+#include "frame/FailSafe.h"
+#include "platform/FileSystem.h"
+
+namespace quendal::fuzz {
+
+inline void Check(bool condition) {
+  if (!condition) std::abort();
+}
+
+// The folder, with a separator at its end, holding nothing.
+inline const std::string& EmptyFolder() {
+  static const std::string folder = [] {
+    std::string pattern = (std::filesystem::temp_directory_path() / "quendal-dayfile-XXXXXX").string();
+    Check(::mkdtemp(pattern.data()) != nullptr);
+    static std::string made;
+    made = pattern;
+    std::atexit([] {
+      std::error_code ec;
+      std::filesystem::remove_all(made, ec);
+    });
+    return pattern + "/";
+  }();
+  std::error_code ec;
+  for (const auto& entry : std::filesystem::directory_iterator(folder, ec))
+    std::filesystem::remove_all(entry.path(), ec);
+  return folder;
+}
+
+// Writes the input as the day file; an empty input stands for no file at all.
+inline void Lay(const std::string& path, std::string_view bytes) {
+  if (!bytes.empty()) Check(AppendFile(path, bytes));
+}
+
+class CountingPrompt : public ErrorPrompt {
+ public:
+  Answer Ask(const std::string&, const std::string&) override {
+    ++asked;
+    return Answer::Abort;
+  }
+  int asked = 0;
+};
+
+// Installs a counting prompt for the whole run and returns it.
+inline CountingPrompt& Prompt() {
+  static const auto prompt = [] {
+    auto p = std::make_shared<CountingPrompt>();
+    SetErrorPrompt(p);
+    return p;
+  }();
+  return *prompt;
+}
+
+}  // namespace quendal::fuzz

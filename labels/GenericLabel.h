@@ -73,9 +73,8 @@ constexpr std::array<vpcl::Packet, 8> SenderBlock(int row) {
   }};
 }
 
-
-// 1-8, 10, 11: sender, carrier, consignment and receiver.
-inline constexpr std::array<BatchField, 10> kAddressFields = {{
+// 1-8: sender, carrier, consignment and receiver.
+inline constexpr std::array<BatchField, 8> kPartyFields = {{
     {1, &LabelValues::FromName},
     {2, &LabelValues::FromLine3},
     {3, &LabelValues::FromState},
@@ -84,9 +83,14 @@ inline constexpr std::array<BatchField, 10> kAddressFields = {{
     {6, &LabelValues::ToName},
     {7, &LabelValues::ToAddress2},
     {8, [](V v) { return v.ToSuburb + " " + v.ToState + " " + v.ToPostcode; }},
+}};
+// 10, 11: the sender's and the receiver's first address lines.
+inline constexpr std::array<BatchField, 2> kFirstLineFields = {{
     {10, &LabelValues::FromLine2},
     {11, &LabelValues::ToAddress1},
 }};
+// 1-8, 10, 11.
+inline constexpr auto kAddressFields = vpcl::Join(kPartyFields, kFirstLineFields);
 
 // 12, 13: the receiver's postcode and state, printed large.
 inline constexpr std::array<BatchField, 2> kPostcodeFields = {{
@@ -127,37 +131,17 @@ inline constexpr std::array<BatchField, 3> kSsccFields = {{
 constexpr std::array<BatchField, 29> GenericBatch(BatchField::Data shipTo,
                                                   BatchField::Data shipToLine) {
   using generic::V;
-  return {{
-      {1, &LabelValues::FromName},
-      {2, &LabelValues::FromLine3},
-      {3, &LabelValues::FromState},
-      {4, &LabelValues::CarrierName},
-      {5, &LabelValues::ConNoteNo},
-      {6, &LabelValues::ToName},
-      {7, &LabelValues::ToAddress2},
-      {8, [](V v) { return v.ToSuburb + " " + v.ToState + " " + v.ToPostcode; }},
-      {9, &LabelValues::StoreText},
-      {10, &LabelValues::FromLine2},
-      {11, &LabelValues::ToAddress1},
+  const std::array<BatchField, 1> store = {{{9, &LabelValues::StoreText}}};
+  const std::array<BatchField, 5> barcodes = {{
       {15, &LabelValues::ATLNumber, generic::AuthorityToLeave},
       {16, [](V v) { return v.ATLNumber + "     ATL"; }, generic::AuthorityToLeave},
       {17, shipTo},
       {18, shipToLine},
       {19, elements::SsccLine},
-      {20, &LabelValues::OrderLine},
-      {21, &LabelValues::SalesOrderLine},
-      {24, elements::Sscc},
-      {25, elements::SsccLine},
-      {26, &LabelValues::UserText1},
-      {27, &LabelValues::UserText2},
-      {28, &LabelValues::ToSuburbUpper},
-      {29, &LabelValues::PostcodeServiceLine},
-      {30, &LabelValues::ServiceLine},
-      {31, &LabelValues::PackedLine},
-      {32, &LabelValues::NotBeforeLine},
-      {33, &LabelValues::NotAfterLine},
-      {34, [](V v) { return "C/N:" + v.ConNoteNo; }},
   }};
+  const std::array<BatchField, 2> sscc = {{{24, elements::Sscc}, {25, elements::SsccLine}}};
+  return vpcl::Join(generic::kPartyFields, store, generic::kFirstLineFields, barcodes,
+                    generic::kOrderFields, sscc, generic::kTailFields);
 }
 
 }  // namespace quendal

@@ -527,16 +527,9 @@ TEST_F(StarTrackDAclnTest, KilledAtAnyMomentTheFileHoldsOnlyWholeConsignments) {
     if (lines.empty()) return numbers;
     EXPECT_EQ(lines[0] + "\r\n", Header("SRX00501.CLN"));
     // Each consignment: "10", "13", three "15" and an item "20" per pack.
-    for (std::size_t i = 1; i < lines.size(); i += 7) {
-      const std::string no = lines[i].substr(2, 20);
-      std::string kinds;
-      for (std::size_t j = i; j < i + 7 && j < lines.size(); ++j) {
-        kinds += lines[j].substr(0, 2) + " ";
-        EXPECT_EQ(lines[j].substr(2, 20), no) << "line " << j;
-      }
-      EXPECT_EQ(kinds, "10 13 15 15 15 20 20 ") << "line " << i;
-      EXPECT_EQ(lines[i].size(), Consignment().size() - 2) << "line " << i;
-      numbers.push_back(std::stoi(no.substr(1)));
+    for (const std::string& first : test::ClnConsignments(lines, "10 13 15 15 15 20 20 ")) {
+      EXPECT_EQ(first.size(), Consignment().size() - 2) << first;
+      numbers.push_back(std::stoi(first.substr(3, 19)));
     }
     return numbers;
   };

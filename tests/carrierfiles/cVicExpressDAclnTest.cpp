@@ -179,16 +179,9 @@ TEST_F(VicExpressDAclnTest, KilledAtAnyMomentTheFileHoldsOnlyWholeConsignments) 
     if (lines.empty()) return numbers;
     EXPECT_EQ(lines[0] + "\r\n", Header("VEX0104504.CLN", Stamp(today)));
     // Each consignment: "10", two "15" and an item "20" per pack.
-    for (std::size_t i = 1; i < lines.size(); i += 5) {
-      const std::string no = lines[i].substr(2, 20);
-      std::string kinds;
-      for (std::size_t j = i; j < i + 5 && j < lines.size(); ++j) {
-        kinds += lines[j].substr(0, 2) + " ";
-        EXPECT_EQ(lines[j].substr(2, 20), no) << "line " << j;
-      }
-      EXPECT_EQ(kinds, "10 15 15 20 20 ") << "line " << i;
-      EXPECT_EQ(lines[i] + "\r\n", Consignment(Trim(no), "   2", "    2")) << "line " << i;
-      numbers.push_back(std::stoi(no.substr(1)));
+    for (const std::string& first : test::ClnConsignments(lines, "10 15 15 20 20 ")) {
+      EXPECT_EQ(first + "\r\n", Consignment(Trim(first.substr(2, 20)), "   2", "    2"));
+      numbers.push_back(std::stoi(first.substr(3, 19)));
     }
     // One day, one file: a kill never leaves a second one started.
     EXPECT_EQ(std::distance(fs::directory_iterator(folder), fs::directory_iterator()), 1);

@@ -12,6 +12,8 @@
 #include <memory>
 #include <string>
 #include <string_view>
+#include <utility>
+#include <vector>
 
 #include "frame/FailSafe.h"
 #include "platform/FileSystem.h"
@@ -44,6 +46,21 @@ inline const std::string& EmptyFolder() {
 // Writes the input as the day file; an empty input stands for no file at all.
 inline void Lay(const std::string& path, std::string_view bytes) {
   if (!bytes.empty()) Check(AppendFile(path, bytes));
+}
+
+// The files a call wrote, with their bytes: every file of the folder but
+// hidden ones, the day file only when it no longer holds `before`.
+inline std::vector<std::pair<std::string, std::string>> Written(const std::string& folder,
+                                                                const std::string& path,
+                                                                const std::string& before) {
+  std::vector<std::pair<std::string, std::string>> files;
+  for (const auto& entry : std::filesystem::directory_iterator(folder)) {
+    if (entry.path().filename().string().starts_with(".")) continue;
+    std::string bytes = ReadFile(entry.path().string()).value_or("");
+    if (entry.path().string() == path && bytes == before) continue;
+    files.emplace_back(entry.path().string(), std::move(bytes));
+  }
+  return files;
 }
 
 class CountingPrompt : public ErrorPrompt {

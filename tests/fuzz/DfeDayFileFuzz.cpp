@@ -4,7 +4,6 @@
 // the day file, or a file beside it when the day file can't be extended.
 #include <cstddef>
 #include <cstdint>
-#include <filesystem>
 #include <pugixml.hpp>
 #include <string>
 
@@ -57,11 +56,7 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
   }
   // Exactly one file of the folder holds the consignment, once, and parses.
   int holding = 0;
-  for (const auto& entry : std::filesystem::directory_iterator(folder)) {
-    const std::string name = entry.path().filename().string();
-    if (name.starts_with(".")) continue;
-    const std::string bytes = ReadFile(entry.path().string()).value_or("");
-    if (entry.path().string() == path && bytes == before) continue;  // kept as it was
+  for (const auto& [file, bytes] : fuzz::Written(folder, path, before)) {
     if (bytes.find("<Connote>4021710000001</Connote>") == std::string::npos) continue;
     ++holding;
     pugi::xml_document doc;

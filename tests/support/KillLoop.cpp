@@ -116,4 +116,21 @@ KillLoopResult RunKillLoop(const KillLoop& loop) {
   return result;
 }
 
+std::vector<std::string> ClnConsignments(const std::vector<std::string>& lines,
+                                         std::string_view codes) {
+  std::vector<std::string> firsts;
+  const std::size_t size = codes.size() / 3;
+  for (std::size_t i = 1; i < lines.size(); i += size) {
+    const std::string no = lines[i].substr(2, 20);
+    std::string kinds;
+    for (std::size_t j = i; j < i + size && j < lines.size(); ++j) {
+      kinds += lines[j].substr(0, 2) + " ";
+      EXPECT_EQ(lines[j].substr(2, 20), no) << "line " << j;
+    }
+    EXPECT_EQ(kinds, codes) << "line " << i;
+    firsts.push_back(lines[i]);
+  }
+  return firsts;
+}
+
 }  // namespace quendal::test

@@ -20,6 +20,7 @@
 
 #include <chrono>
 #include <functional>
+#include <string>
 #include <string_view>
 #include <vector>
 
@@ -47,6 +48,14 @@ struct KillLoopResult {
 };
 
 KillLoopResult RunKillLoop(const KillLoop& loop);
+
+// The consignments of a file in the CLN record grammar, after its header
+// line: groups of records whose codes read `codes` ("10 15 20 ", each code
+// followed by a space), all carrying the group's consignment number
+// (columns 3 to 22). Fails the test for a group that is not whole; returns
+// the first line of each group.
+std::vector<std::string> ClnConsignments(const std::vector<std::string>& lines,
+                                         std::string_view codes);
 
 // True when one of the host's log entries named in `ids` has a message that
 // holds `text` (the completion line that tells a call went through).

@@ -5,6 +5,7 @@
 #include <unistd.h>
 
 #include <algorithm>
+#include <csignal>
 #include <cerrno>
 #include <cstdio>
 #include <ctime>
@@ -216,7 +217,30 @@ std::optional<FileStamp> StampOf(const std::string& path) {
 bool AppendingFile::Open(const std::string& path) {
   Close();
   fd_ = ::open(path.c_str(), O_WRONLY | O_APPEND | O_CREAT | O_CLOEXEC, 0644);
-  return fd_ >= 0;
+  if (fd_ < 0) return false;
+  const fs::path target(path);
+  notePath_ = (target.parent_path() / ("." + target.filename().string() + ".append")).string();
+  RepairTornAppend();
+  return true;
+}
+
+void AppendingFile::RepairTornAppend() {
+  std::ifstream in(notePath_, std::ios::binary);
+  if (!in) return;
+  long long pid = 0;
+  long long before = -1;
+  long long length = -1;
+  in >> pid >> before >> length;
+  const bool whole = !in.fail();
+  in.close();
+  // A writer that is still at work (another station) finishes its own append.
+  if (whole && pid > 0 && pid != ::getpid() && ::kill(static_cast<pid_t>(pid), 0) == 0) return;
+  struct stat st {};
+  if (whole && before >= 0 && length > 0 && ::fstat(fd_, &st) == 0 && st.st_size > before &&
+      st.st_size < before + length) {
+    if (::ftruncate(fd_, before) != 0) return;  // keep the note for the next call
+  }
+  ::unlink(notePath_.c_str());
 }
 
 std::optional<FileStamp> AppendingFile::Stamp() const {
@@ -229,7 +253,18 @@ bool AppendingFile::Append(std::string_view bytes) {
   if (fd_ < 0) return false;
   struct stat st {};
   if (::fstat(fd_, &st) != 0) return false;
-  if (WriteAll(fd_, bytes)) return true;
+  const std::string note = std::to_string(::getpid()) + " " + std::to_string(st.st_size) + " " +
+                           std::to_string(bytes.size()) + "\n";
+  // A note cut short by a kill was written before any of the bytes, and is dropped.
+  bool noted = false;
+  if (const int fd = ::open(notePath_.c_str(), O_WRONLY | O_CREAT | O_TRUNC | O_CLOEXEC, 0644);
+      fd >= 0) {
+    noted = WriteAll(fd, note);
+    noted = ::close(fd) == 0 && noted;
+  }
+  const bool written = WriteAll(fd_, bytes);
+  if (noted) ::unlink(notePath_.c_str());
+  if (written) return true;
   // Take back what the failed write left behind.
   const int cut = ::ftruncate(fd_, st.st_size);
   static_cast<void>(cut);

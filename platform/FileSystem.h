@@ -68,6 +68,15 @@ std::optional<FileStamp> StampOf(const std::string& path);
 
 // A file opened for appending (created when missing) and closed again when
 // the object goes or Close is called.
+//
+// A process killed while it appends can leave part of what it meant to
+// write (the kernel stops a large write at a page when the process dies).
+// So each Append first leaves a note beside the file (".name.append": the
+// writer's process id, the file's length before and the length to add) and
+// removes it once the bytes are in; Open finds a note whose writer is gone
+// and cuts the file back to its length before that append, when the file
+// still ends in the torn part. A file that grew beyond it since is left
+// alone.
 class AppendingFile {
  public:
   AppendingFile() = default;
@@ -85,7 +94,11 @@ class AppendingFile {
   void Close();
 
  private:
+  // Cuts back an append that a dead writer left torn, and drops its note.
+  void RepairTornAppend();
+
   int fd_ = -1;
+  std::string notePath_;
 };
 
 // A file opened for reading and writing in place, for replacing its end.

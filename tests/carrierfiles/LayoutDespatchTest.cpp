@@ -10,6 +10,7 @@
 #include "carrierfiles/cMayneDAcl.h"
 #include "platform/Clock.h"
 #include "platform/FileSystem.h"
+#include "tests/support/KillLoop.h"
 #include "tests/support/MemoryHost.h"
 #include "tests/support/Records.h"
 #include "tests/support/TempFolder.h"
@@ -236,6 +237,38 @@ TEST_F(LayoutDespatchTest, AFolderWithoutItsSeparatorIsRefused) {
   Process(cls, ConNote("IPE00012346"));
   EXPECT_EQ(host.LogMessages().back(), "Invalid folder " + temp.path());
   EXPECT_TRUE(Files().empty());
+}
+
+// A process killed at any moment while it adds consignments leaves whole
+// consignments before the trailer, and the next call completes or drops
+// what the kill interrupted before it adds its own.
+TEST_F(LayoutDespatchTest, Ipec1250KilledAtAnyMomentKeepsWholeConsignmentsAndItsTrailer) {
+  clsIpecDA1250 cls;
+  test::KillLoop loop;
+  loop.write = [&](int n) {
+    const std::size_t asked = answers->messages.size();
+    const LogList log = Process(cls, ConNote("I" + std::to_string(n)));
+    return answers->messages.size() == asked && test::Logged(host, log, "compile completed.");
+  };
+  loop.read = [&] {
+    const std::vector<std::string> lines = Lines("T1250_IPE__20240314093000.DAT");
+    std::vector<int> numbers;
+    EXPECT_GE(lines.size(), 2u);
+    if (lines.size() < 2) return numbers;
+    EXPECT_EQ(lines[lines.size() - 2], "20240314");
+    EXPECT_EQ(lines.back(), "%%EOF");
+    EXPECT_EQ((lines.size() - 2) % 3, 0u);
+    for (std::size_t i = 0; i + 2 < lines.size() - 2; i += 3) {
+      const std::string no = lines[i].substr(19, 12);
+      EXPECT_EQ(lines[i].substr(0, 9), "40240314C") << "line " << i;
+      EXPECT_EQ(lines[i].size(), 460u) << "line " << i;
+      EXPECT_EQ(lines[i + 1], "40240314I" + no + "0001" + Sscc(1) + "0006.3") << "line " << i + 1;
+      EXPECT_EQ(lines[i + 2], "40240314I" + no + "0002" + Sscc(2) + "0006.3") << "line " << i + 2;
+      numbers.push_back(std::stoi(no.substr(1)));
+    }
+    return numbers;
+  };
+  test::RunKillLoop(loop);
 }
 
 }  // namespace

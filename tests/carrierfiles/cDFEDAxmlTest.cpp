@@ -1,17 +1,15 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
-#include <sys/wait.h>
-#include <unistd.h>
 
-#include <csignal>
+#include <map>
 #include <pugixml.hpp>
-#include <set>
 
 #include "carrierfiles/TailJournal.h"
 #include "carrierfiles/cDFEDAxml.h"
 #include "tests/carrierfiles/DfeGolden.h"
 #include "tests/manifests/StarTrackRowsFixture.h"
 #include "tests/support/FileSizeLimit.h"
+#include "tests/support/KillLoop.h"
 
 namespace quendal {
 namespace {
@@ -258,30 +256,29 @@ TEST_F(DFEDAxmlTest, AFailedWriteLeavesTheDayFileAndACrashedOneIsCompleted) {
 // day file that the next call can't extend: it parses and holds every
 // consignment whole and once.
 TEST_F(DFEDAxmlTest, KilledAtAnyMomentTheNextConsignmentFindsAWholeFile) {
-  int next = 1000;
-  for (int round = 0; round < 12; ++round) {
-    const pid_t child = fork();
-    ASSERT_GE(child, 0);
-    if (child == 0) {
-      for (int i = next; i < next + 200; ++i) Process(AddCartons(i, "D" + std::to_string(i), 2));
-      _exit(0);
-    }
-    usleep(static_cast<useconds_t>(3000 + 2500 * round));
-    kill(child, SIGKILL);
-    waitpid(child, nullptr, 0);
-
-    Process(AddCartons(next + 500, "D" + std::to_string(next + 500), 2));
+  test::KillLoop loop;
+  loop.write = [&](int n) {
+    const LogList log = Process(AddCartons(n, std::to_string(n), 2));
+    return test::Logged(host, log, "compile completed.");
+  };
+  loop.read = [&] {
     const std::string file = File();
-    const std::vector<std::string> connotes = Connotes(file);
-    EXPECT_EQ(std::set<std::string>(connotes.begin(), connotes.end()).size(), connotes.size());
-    pugi::xml_document doc;
-    doc.load_string(file.c_str());
-    for (pugi::xml_node table : doc.child("NewDataSet").children("Table2"))
-      EXPECT_EQ(std::string(table.child_value("LabelTrackCode")).size(), 20u);
-    EXPECT_EQ(doc.child("NewDataSet").select_nodes("Table2").size(), 2 * connotes.size());
     EXPECT_TRUE(file.ends_with(kTail));
-    next += 1000;
-  }
+    pugi::xml_document doc;
+    EXPECT_TRUE(doc.load_buffer(file.data(), file.size()));
+    std::vector<int> numbers;
+    std::map<std::string, int> labels;
+    for (pugi::xml_node table : doc.child("NewDataSet").children("Table"))
+      numbers.push_back(std::stoi(std::string(table.child_value("Connote")).substr(6)));
+    for (pugi::xml_node table : doc.child("NewDataSet").children("Table2")) {
+      EXPECT_EQ(std::string(table.child_value("LabelTrackCode")).size(), 20u);
+      ++labels[table.child_value("Connote")];
+    }
+    for (const auto& [connote, count] : labels) EXPECT_EQ(count, 2) << connote;
+    EXPECT_EQ(labels.size(), numbers.size());
+    return numbers;
+  };
+  test::RunKillLoop(loop);
 }
 
 }  // namespace

@@ -8,6 +8,7 @@
 #include "platform/Clock.h"
 #include "platform/DirectorySpooler.h"
 #include "platform/FileSystem.h"
+#include "tests/support/KillLoop.h"
 #include "tests/support/MemoryHost.h"
 #include "tests/support/Records.h"
 #include "tests/support/TempFolder.h"
@@ -507,6 +508,33 @@ TEST_F(StarTrackDAclnTest, LineBreaksInHostTextsDoNotSplitRecords) {
   c->fields["DeliveryInstructions"] = "Rear\r\ndock";
   Process(c);
   EXPECT_THAT(File("SRX00501.CLN"), HasSubstr("Rear  dock" + Sp(15) + "202403150700"));
+}
+
+// A process killed at any moment while it adds consignments leaves the
+// header and whole consignments only, and the next call adds to that file.
+TEST_F(StarTrackDAclnTest, KilledAtAnyMomentTheFileHoldsOnlyWholeConsignments) {
+  test::ScriptedPrompt answers;
+  test::PromptScope prompt{std::shared_ptr<ErrorPrompt>(&answers, [](ErrorPrompt*) {})};
+  test::KillLoop loop;
+  loop.write = [&](int n) {
+    const std::size_t asked = answers.messages.size();
+    const LogList log = Process(ConNote("K" + std::to_string(n), 2));
+    return answers.messages.size() == asked && test::Logged(host, log, "compile completed.");
+  };
+  loop.read = [&] {
+    const std::vector<std::string> lines = test::CrLfLines(File("SRX00501.CLN"));
+    std::vector<int> numbers;
+    EXPECT_FALSE(lines.empty());
+    if (lines.empty()) return numbers;
+    EXPECT_EQ(lines[0] + "\r\n", Header("SRX00501.CLN"));
+    // Each consignment: "10", "13", three "15" and an item "20" per pack.
+    for (const std::string& first : test::ClnConsignments(lines, "10 13 15 15 15 20 20 ")) {
+      EXPECT_EQ(first.size(), Consignment().size() - 2) << first;
+      numbers.push_back(std::stoi(first.substr(3, 19)));
+    }
+    return numbers;
+  };
+  test::RunKillLoop(loop);
 }
 
 }  // namespace

@@ -1,17 +1,14 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
-#include <sys/wait.h>
-#include <unistd.h>
 
-#include <csignal>
 #include <filesystem>
-#include <set>
 
 #include "carrierfiles/TailJournal.h"
 #include "carrierfiles/cTNTDAet11.h"
 #include "platform/Clock.h"
 #include "platform/FileSystem.h"
 #include "tests/support/FileSizeLimit.h"
+#include "tests/support/KillLoop.h"
 #include "tests/support/MemoryHost.h"
 #include "tests/support/Records.h"
 #include "tests/support/TempFolder.h"
@@ -219,42 +216,34 @@ TEST_F(TNTDAet11Test, AFailedWriteLeavesTheDayFileAndACrashedOneIsCompleted) {
 // day file that the next consignment can't complete: every consignment is
 // whole and there once, and the trailer counts the lines.
 TEST_F(TNTDAet11Test, KilledAtAnyMomentTheNextConsignmentFindsAWholeFile) {
-  int next = 1000;
-  for (int round = 0; round < 20; ++round) {
-    const pid_t child = fork();
-    ASSERT_GE(child, 0);
-    if (child == 0) {
-      for (int i = next; i < next + 200; ++i) Process(ConNote(102, "N" + std::to_string(i), 2));
-      _exit(0);
-    }
-    usleep(static_cast<useconds_t>(2000 + 1700 * round));
-    kill(child, SIGKILL);
-    waitpid(child, nullptr, 0);
-
-    Process(ConNote(102, "N" + std::to_string(next + 500), 2));
-    const std::string file = File();
-    std::vector<std::string> lines;
-    for (std::size_t at = 0, end; (end = file.find("\r\n", at)) != std::string::npos; at = end + 2)
-      lines.push_back(file.substr(at, end - at));
-    ASSERT_GE(lines.size(), 7u);
+  test::KillLoop loop;
+  loop.write = [&](int n) {
+    auto conNote = ConNote(102, "N" + std::to_string(n), 2);
+    LogList log;
+    cls.Process(host.system, conNote, asn, PacksOf(conNote), log);
+    return log.empty();  // the class logs only what went wrong
+  };
+  loop.read = [&] {
+    const std::vector<std::string> lines = test::CrLfLines(File());
+    std::vector<int> numbers;
+    EXPECT_GE(lines.size(), 3u);
+    if (lines.size() < 3) return numbers;
     EXPECT_EQ(lines[0][0], 'A');
     EXPECT_EQ(lines[1][0], 'B');
     char count[8];
     std::snprintf(count, sizeof count, "%05zu", lines.size());
     EXPECT_EQ(lines.back() + "\r\n", Z(count));
-    std::set<std::string> numbers;
     std::string kinds;
     for (std::size_t i = 2; i + 1 < lines.size(); ++i) {
       kinds += lines[i][0];
-      if (lines[i][0] == 'C') {
-        EXPECT_TRUE(numbers.insert(lines[i].substr(11, 15)).second) << lines[i];
-      }
+      if (lines[i][0] == 'C') numbers.push_back(std::stoi(lines[i].substr(12, 14)));
     }
     std::string whole;
     for (std::size_t i = 0; i < numbers.size(); ++i) whole += "CEFH";
     EXPECT_EQ(kinds, whole);
-    next += 1000;
-  }
+    return numbers;
+  };
+  test::RunKillLoop(loop);
 }
 
 }  // namespace

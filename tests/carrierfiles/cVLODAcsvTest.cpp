@@ -3,6 +3,8 @@
 #include <filesystem>
 
 #include "tests/carrierfiles/MapCsvFixture.h"
+#include "tests/support/KillLoop.h"
+#include "tests/support/Records.h"
 
 namespace quendal {
 namespace {
@@ -178,6 +180,35 @@ TEST_F(VLODAcsvTest, LoadTakesNoRowsAndBothLogBeforeAnyProcess) {
               ElementsAre("No Packs found to process. Quendal.clsVLODAcsv takes consignments "
                           "through Process only.",
                           "ASN map file " + folder + " cannot be read."));
+}
+
+// A process killed at any moment while it adds consignments leaves whole
+// lines of whole consignments only, and the next call adds to that file.
+TEST_F(VLODAcsvTest, KilledAtAnyMomentTheFileHoldsOnlyWholeConsignments) {
+  Map("VLODA.map", "CONSIGNMENTNOTENO\r\nCONTAINERNO\r\nPACKWEIGHT\r\n");
+  test::ScriptedPrompt answers;
+  test::PromptScope prompt{std::shared_ptr<ErrorPrompt>(&answers, [](ErrorPrompt*) {})};
+  test::KillLoop loop;
+  loop.write = [&](int n) {
+    const std::size_t asked = answers.messages.size();
+    const LogList log = Process(vlo, ConNote("V" + std::to_string(n), 2));
+    return answers.messages.size() == asked && test::Logged(host, log, "compile completed.");
+  };
+  loop.read = [&] {
+    const std::string text = Output();
+    EXPECT_TRUE(text.empty() || text.ends_with("\r\n"));
+    const std::vector<std::string> lines = test::CrLfLines(text);
+    std::vector<int> numbers;
+    EXPECT_EQ(lines.size() % 2, 0u);
+    for (std::size_t i = 0; i + 1 < lines.size(); i += 2) {
+      const std::string no = lines[i].substr(0, lines[i].find(','));
+      EXPECT_EQ(lines[i] + "\r\n", CsvLine({no, kCsvSscc[0], "310.5"})) << "line " << i;
+      EXPECT_EQ(lines[i + 1] + "\r\n", CsvLine({no, kCsvSscc[1], "8.13"})) << "line " << i + 1;
+      numbers.push_back(std::stoi(no.substr(1)));
+    }
+    return numbers;
+  };
+  test::RunKillLoop(loop);
 }
 
 }  // namespace

@@ -7,6 +7,7 @@
 #include "frame/VB.h"
 #include "platform/Clock.h"
 #include "platform/FileSystem.h"
+#include "tests/support/KillLoop.h"
 #include "tests/support/MemoryHost.h"
 #include "tests/support/Records.h"
 #include "tests/support/TempFolder.h"
@@ -155,6 +156,38 @@ TEST_F(VicExpressDAclnTest, PacksWithoutWeightAnEmptyPackListAndAMissingFolder) 
   Process("VEX4", {Pack("00093123450000100279", "CTN01", 2)});
   EXPECT_EQ(host.LogMessages().back(), "Cannot open file " + temp.path() + "/missing/");
   EXPECT_EQ(host.logs.back().at("Procedure").Text(), "Open carrier message file");
+}
+
+// A process killed at any moment while it adds consignments leaves the
+// header and whole consignments only, and the next call adds to that file.
+TEST_F(VicExpressDAclnTest, KilledAtAnyMomentTheFileHoldsOnlyWholeConsignments) {
+  test::ScriptedPrompt answers;
+  test::PromptScope prompt{std::shared_ptr<ErrorPrompt>(&answers, [](ErrorPrompt*) {})};
+  test::KillLoop loop;
+  loop.write = [&](int n) {
+    const std::size_t asked = answers.messages.size();
+    const std::size_t logged = host.logs.size();
+    Process("V" + std::to_string(n), {Pack("00093123450000100231", "CTN01", 1.2),
+                                      Pack("00093123450000100248", "CTN01", 1.3)});
+    // The class logs only what went wrong.
+    return answers.messages.size() == asked && host.logs.size() == logged;
+  };
+  loop.read = [&] {
+    const std::vector<std::string> lines = test::CrLfLines(File(Name(today)));
+    std::vector<int> numbers;
+    EXPECT_FALSE(lines.empty());
+    if (lines.empty()) return numbers;
+    EXPECT_EQ(lines[0] + "\r\n", Header("VEX0104504.CLN", Stamp(today)));
+    // Each consignment: "10", two "15" and an item "20" per pack.
+    for (const std::string& first : test::ClnConsignments(lines, "10 15 15 20 20 ")) {
+      EXPECT_EQ(first + "\r\n", Consignment(Trim(first.substr(2, 20)), "   2", "    2"));
+      numbers.push_back(std::stoi(first.substr(3, 19)));
+    }
+    // One day, one file: a kill never leaves a second one started.
+    EXPECT_EQ(std::distance(fs::directory_iterator(folder), fs::directory_iterator()), 1);
+    return numbers;
+  };
+  test::RunKillLoop(loop);
 }
 
 }  // namespace

@@ -2,6 +2,7 @@
 
 #include "manifests/ceParcelManifestxml.h"
 #include "tests/manifests/eParcelFixture.h"
+#include "tests/support/KillLoop.h"
 
 namespace quendal {
 namespace {
@@ -389,6 +390,45 @@ TEST_F(eParcelManifestTest, NullHostDataNeverStopsTheRunNorLeavesHalfAConsignmen
   EXPECT_EQ(Values(file, "//Length"), Strings{""});
   EXPECT_EQ(Values(file, "//TransactionId"), Strings{""});
   EXPECT_TRUE(Values(file, "//DeliveryCompanyName").empty());
+}
+
+// A process killed at any moment of its manifest runs (each run one
+// consignment: Init, Load, Process, Term) leaves one day file that parses
+// and holds every consignment of a finished run once.
+TEST_F(eParcelManifestTest, KilledAtAnyMomentTheDayFileParsesAndHoldsEachRunOnce) {
+  ClockOnRealDate();
+  test::ScriptedPrompt answers;
+  test::PromptScope prompt{std::shared_ptr<ErrorPrompt>(&answers, [](ErrorPrompt*) {})};
+  auto order = MakeOrder({{"Name", "J SMITH"}, {"Suburb", "RICHMOND"}, {"Postcode", "3121"}});
+  test::KillLoop loop;
+  loop.write = [&](int n) {
+    char number[16];
+    std::snprintf(number, sizeof number, "NPP%07d", n);
+    AddConNote(n, number, 1, order);
+    const std::size_t asked = answers.messages.size();
+    auto object = CreateObject(kManifestClass).object;
+    auto* run = as<RowInterface>(object);
+    Grid columns, grid;
+    LogList log;
+    return run->Init(host.system, 7, columns) && run->Load("", grid) == 1 &&
+           run->Process(0, log) == n && run->Term() && answers.messages.size() == asked;
+  };
+  loop.read = [&] {
+    std::vector<int> numbers;
+    const Strings files = FilesInFolder();
+    std::size_t days = 0;
+    for (const std::string& name : files) {
+      if (name.starts_with(".")) continue;  // what a kill left of a file not yet in place
+      ++days;
+      EXPECT_TRUE(FileText(name).ends_with("</SendPCMSManifest>\r\n</PCMS>\r\n")) << name;
+      for (const std::string& no : Values(name, "//PCMSConsignment/ConsignmentNumber"))
+        numbers.push_back(std::stoi(no.substr(no.size() - 7)));
+      EXPECT_EQ(Values(name, "//PCMSConsignment").size(), Values(name, "//PCMSDomesticArticle").size());
+    }
+    EXPECT_EQ(days, 1u);
+    return numbers;
+  };
+  test::RunKillLoop(loop);
 }
 
 }  // namespace

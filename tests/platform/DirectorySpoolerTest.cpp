@@ -3,9 +3,11 @@
 #include <gtest/gtest.h>
 
 #include <filesystem>
+#include <set>
 
 #include "frame/Error.h"
 #include "platform/FileSystem.h"
+#include "tests/support/KillLoop.h"
 #include "tests/support/TempFolder.h"
 
 namespace quendal {
@@ -97,6 +99,44 @@ TEST(SafeFileNameTest, KeepsNamesInsideTheFolder) {
   EXPECT_EQ(SafeFileName("../../etc/passwd"), "______etc_passwd");
   EXPECT_EQ(SafeFileName("a\\b:c"), "a_b_c");
   EXPECT_EQ(SafeFileName(""), "_");
+}
+
+// A process killed at any moment while it prints leaves only whole jobs,
+// each under a number of its own, and the next job still goes in.
+TEST_F(DirectorySpoolerTest, KilledAtAnyMomentTheQueueHoldsOnlyWholeJobs) {
+  // A label of a few kilobytes that names its unit throughout.
+  const auto label = [](int n) {
+    std::string bytes;
+    for (int i = 0; i < 200; ++i) bytes += "{B,430,N,1|" + std::to_string(n) + "|}\r\n";
+    return bytes;
+  };
+  DirectorySpooler spooler(root.string());
+  test::KillLoop loop;
+  loop.write = [&](int n) {
+    long error = 0;
+    const auto h = spooler.OpenPrinter("Dock Zebra", error);
+    if (h == 0) return false;
+    const bool ok = spooler.StartDoc(h, "label-" + std::to_string(n)) != 0 &&
+                    spooler.Write(h, label(n)) && spooler.EndDoc(h);
+    spooler.ClosePrinter(h);
+    return ok;
+  };
+  loop.read = [&] {
+    std::vector<int> units;
+    std::set<std::string> jobNumbers;
+    for (const auto& entry : fs::directory_iterator(root / "Dock Zebra")) {
+      const std::string name = entry.path().filename().string();
+      if (name.starts_with(".")) continue;  // the counter, and what a kill left of a job unqueued
+      EXPECT_EQ(name.substr(6, 7), "-label-") << name;
+      EXPECT_TRUE(name.ends_with(".prn")) << name;
+      EXPECT_TRUE(jobNumbers.insert(name.substr(0, 6)).second) << name;
+      const int n = std::stoi(name.substr(13));
+      EXPECT_EQ(ReadFile(entry.path().string()), label(n)) << name;
+      units.push_back(n);
+    }
+    return units;
+  };
+  test::RunKillLoop(loop);
 }
 
 }  // namespace

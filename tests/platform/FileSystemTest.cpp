@@ -1,6 +1,8 @@
 #include "platform/FileSystem.h"
 
 #include <gtest/gtest.h>
+#include <sys/wait.h>
+#include <unistd.h>
 
 #include <filesystem>
 
@@ -65,4 +67,42 @@ TEST_F(FileSystemTest, FoldersAndDeletion) {
 }
 
 }  // namespace
+// What a writer killed in the middle of an append leaves: the note beside
+// the file and part of the bytes. Opening the file again cuts the torn part
+// off, unless its writer is still at work or the file has grown past it.
+TEST_F(FileSystemTest, AnAppendTornByADeadWriterIsCutBackWhenTheFileIsOpened) {
+  const std::string path = temp / "day.CLN";
+  const std::string note = temp / ".day.CLN.append";
+  const pid_t dead = fork();
+  if (dead == 0) _exit(0);
+  waitpid(dead, nullptr, 0);
+  const auto leave = [&](pid_t writer, const std::string& file) {
+    test::WriteText(path, file);
+    test::WriteText(note, std::to_string(writer) + " 6 10\n");
+  };
+  AppendingFile appending;
+  leave(dead, "whole\nhalf");
+  ASSERT_TRUE(appending.Open(path));
+  EXPECT_EQ(test::ReadText(path), "whole\n");
+  EXPECT_FALSE(fs::exists(note));
+  ASSERT_TRUE(appending.Append("next\n"));
+  EXPECT_EQ(test::ReadText(path), "whole\nnext\n");
+  EXPECT_FALSE(fs::exists(note));
+  appending.Close();
+
+  // A whole append, or a file another writer extended since: nothing is cut.
+  for (const std::string file : {"whole\nfour more\n", "whole\nfour more\nand more\n"}) {
+    leave(dead, file);
+    ASSERT_TRUE(appending.Open(path));
+    EXPECT_EQ(test::ReadText(path), file);
+    EXPECT_FALSE(fs::exists(note));
+    appending.Close();
+  }
+  // A writer still at work keeps its note and its bytes.
+  leave(getppid(), "whole\nhalf");
+  ASSERT_TRUE(appending.Open(path));
+  EXPECT_EQ(test::ReadText(path), "whole\nhalf");
+  EXPECT_TRUE(fs::exists(note));
+}
+
 }  // namespace quendal

@@ -1,6 +1,6 @@
 // Carrier record layouts as text: the layout file is the text form of the
 // record builder's field lists, so a site can bring a carrier file in line
-// with the carrier's current specification without a new build.
+// with the carrier's current file description without a new build.
 //
 //   # comments start with "#"; blank lines are ignored
 //   format fixed                 (or: format delimited tab | format delimited ",")

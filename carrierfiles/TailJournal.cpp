@@ -89,7 +89,7 @@ TailJournal::TailJournal(std::string path, std::size_t window)
     : path_(std::move(path)), window_(std::max<std::size_t>(window, 1)) {
   const fs::path file(path_);
   folder_ = file.parent_path().string();
-  journalPath_ = (file.parent_path() / ("." + file.filename().string() + ".journal")).string();
+  journalPath_ = HiddenBeside(path_, ".journal");
 }
 
 bool TailJournal::RemoveJournal() { return DeleteFile(journalPath_) || !FileExists(journalPath_); }

@@ -4,7 +4,6 @@
 #include <unistd.h>
 
 #include <cerrno>
-#include <filesystem>
 
 #include "platform/FileSystem.h"
 
@@ -37,8 +36,7 @@ bool LockWhole(int fd) {
 }  // namespace
 
 std::string FileLock::LockPathOf(const std::string& path) {
-  const std::filesystem::path file(path);
-  return (file.parent_path() / ("." + file.filename().string() + ".lock")).string();
+  return HiddenBeside(path, ".lock");
 }
 
 bool FileLock::Acquire(const std::string& path) {

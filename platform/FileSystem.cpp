@@ -114,9 +114,7 @@ bool AppendFile(const std::string& path, std::string_view bytes) {
 }
 
 bool ReplaceFile(const std::string& path, std::string_view bytes) {
-  const fs::path target(path);
-  std::string tmpl = (target.parent_path() / ("." + target.filename().string() + ".XXXXXX")).string();
-  if (target.parent_path().empty()) tmpl = "." + target.filename().string() + ".XXXXXX";
+  std::string tmpl = HiddenBeside(path, ".XXXXXX");
   const int fd = ::mkstemp(tmpl.data());
   if (fd < 0) return false;
   const bool ok = WriteAll(fd, bytes) && ::fsync(fd) == 0;
@@ -148,7 +146,7 @@ bool SyncFolder(const std::string& folder) {
 NewFile WriteNewFile(const std::string& path, std::string_view bytes) {
   const fs::path target(path);
   const std::string folder = target.parent_path().string();
-  std::string tmpl = (target.parent_path() / ("." + target.filename().string() + ".XXXXXX")).string();
+  std::string tmpl = HiddenBeside(path, ".XXXXXX");
   const int fd = ::mkstemp(tmpl.data());
   if (fd < 0) return NewFile::Failed;
   const bool written = WriteAll(fd, bytes) && ::fsync(fd) == 0 && ::fchmod(fd, 0644) == 0;
@@ -208,6 +206,11 @@ std::string PathBeside(const std::string& path, int n) {
       .string();
 }
 
+std::string HiddenBeside(const std::string& path, std::string_view suffix) {
+  const fs::path file(path);
+  return (file.parent_path() / ("." + file.filename().string() + std::string(suffix))).string();
+}
+
 std::optional<FileStamp> StampOf(const std::string& path) {
   struct stat st {};
   if (::stat(path.c_str(), &st) != 0 || !S_ISREG(st.st_mode)) return std::nullopt;
@@ -218,8 +221,7 @@ bool AppendingFile::Open(const std::string& path) {
   Close();
   fd_ = ::open(path.c_str(), O_WRONLY | O_APPEND | O_CREAT | O_CLOEXEC, 0644);
   if (fd_ < 0) return false;
-  const fs::path target(path);
-  notePath_ = (target.parent_path() / ("." + target.filename().string() + ".append")).string();
+  notePath_ = HiddenBeside(path, ".append");
   RepairTornAppend();
   return true;
 }

@@ -37,6 +37,9 @@ std::optional<std::string> ReadFileHead(const std::string& path, std::size_t max
 // The n-th name beside a file that must be left alone: "name_2.xml",
 // "name_3.xml", ... in the same folder, with the same extension.
 std::string PathBeside(const std::string& path, int n);
+// The hidden file beside `path` that belongs to it: ".<file name><suffix>"
+// in the same folder (its journal, lock or append note).
+std::string HiddenBeside(const std::string& path, std::string_view suffix);
 // Makes the folder's entries (files created, renamed or removed in it) durable.
 bool SyncFolder(const std::string& folder);
 

@@ -16,17 +16,11 @@
 #include <string>
 #include <thread>
 
+#include "tests/support/EnvCount.h"
+
 namespace quendal::test {
 
 namespace {
-
-long EnvNumber(const char* name, long fallback) {
-  const char* text = std::getenv(name);
-  if (!text || !*text) return fallback;
-  char* end = nullptr;
-  const long value = std::strtol(text, &end, 10);
-  return end && *end == '\0' && value > 0 ? value : fallback;
-}
 
 // The child's side: write units and report each success. Never returns.
 [[noreturn]] void Child(const KillLoop& loop, int first, int fd) {
@@ -61,8 +55,8 @@ std::vector<int> Reported(int fd) {
 }  // namespace
 
 KillLoopResult RunKillLoop(const KillLoop& loop) {
-  const long rounds = EnvNumber("QUENDAL_KILL_ROUNDS", loop.rounds);
-  const auto seed = static_cast<std::uint32_t>(EnvNumber("QUENDAL_KILL_SEED", std::random_device{}()));
+  const long rounds = EnvCount("QUENDAL_KILL_ROUNDS", loop.rounds);
+  const auto seed = static_cast<std::uint32_t>(EnvCount("QUENDAL_KILL_SEED", std::random_device{}()));
   SCOPED_TRACE("QUENDAL_KILL_SEED=" + std::to_string(seed));
   std::mt19937 random(seed);
   std::uniform_int_distribution<long> delay(0, loop.maxDelay.count());

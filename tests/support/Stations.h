@@ -7,19 +7,13 @@
 #include <sys/wait.h>
 #include <unistd.h>
 
-#include <cstdlib>
 #include <functional>
 #include <string>
 #include <vector>
 
-namespace quendal::test {
+#include "tests/support/EnvCount.h"
 
-// A number from the environment (for longer runs by hand), else `fallback`.
-inline int EnvCount(const char* name, int fallback) {
-  const char* text = std::getenv(name);
-  const int value = text ? std::atoi(text) : 0;
-  return value > 0 ? value : fallback;
-}
+namespace quendal::test {
 
 class Stations {
  public:

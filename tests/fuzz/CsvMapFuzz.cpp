@@ -13,50 +13,22 @@
 #include <vector>
 
 #include "carrierfiles/CsvMap.h"
+#include "tests/fuzz/FuzzInput.h"
+
+using quendal::fuzz::Check;
 
 namespace {
 
 constexpr std::array<std::string_view, 6> kCatalogue = {
     "CONSIGNMENTNOTENO", "CONTAINERNO", "PACKWEIGHT", "RECEIVERNAME", "SHIPNOTESTATUS", "A"};
 
-void Check(bool condition) {
-  if (!condition) std::abort();
-}
-
-// Reads a comma-separated line back into its values (double quotes group,
-// a doubled quote inside them stands for one).
-std::vector<std::string> ReadLine(std::string_view line) {
-  std::vector<std::string> values(1);
-  bool quoted = false;
-  for (std::size_t i = 0; i < line.size(); ++i) {
-    const char c = line[i];
-    if (quoted && c == '"' && i + 1 < line.size() && line[i + 1] == '"') {
-      values.back() += '"';
-      ++i;
-    } else if (c == '"' && (quoted || values.back().empty())) {
-      quoted = !quoted;
-    } else if (c == ',' && !quoted) {
-      values.emplace_back();
-    } else {
-      values.back() += c;
-    }
-  }
-  Check(!quoted);
-  return values;
-}
-
 }  // namespace
 
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
   if (size == 0) return 0;
-  // The first byte gives the length of a value taken from the end of the
-  // input (0: a value with a comma, quotes and a line break), written in
-  // every column that names a field; the bytes between are the map file.
-  const std::string_view input(reinterpret_cast<const char*>(data) + 1, size - 1);
-  const std::size_t length = std::min<std::size_t>(data[0] % 17, input.size());
-  const std::string_view bytes = input.substr(0, input.size() - length);
-  const std::string_view value =
-      length == 0 ? std::string_view("a,\"b\"\r\n") : input.substr(input.size() - length);
+  // The map file, and a value (by default with a comma, quotes and a line
+  // break) written in every column that names a field.
+  const auto [bytes, value] = quendal::fuzz::SplitInput(data, size, "a,\"b\"\r\n");
 
   const quendal::CsvMap map = quendal::ReadCsvMap(bytes, kCatalogue);
   for (const std::ptrdiff_t column : map.columns)
@@ -76,7 +48,7 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
   }
   std::string written(value);
   std::replace_if(written.begin(), written.end(), [](char c) { return c == '\r' || c == '\n'; }, ' ');
-  const std::vector<std::string> values = ReadLine(line);
+  const std::vector<std::string> values = quendal::fuzz::DelimitedValues(line, ',');
   Check(values.size() == map.columns.size());
   for (std::size_t i = 0; i < values.size(); ++i)
     Check(values[i] == (map.columns[i] == quendal::kNoField ? std::string() : written));

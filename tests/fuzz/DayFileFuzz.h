@@ -17,12 +17,9 @@
 
 #include "frame/FailSafe.h"
 #include "platform/FileSystem.h"
+#include "tests/fuzz/FuzzInput.h"
 
 namespace quendal::fuzz {
-
-inline void Check(bool condition) {
-  if (!condition) std::abort();
-}
 
 // The folder, with a separator at its end, holding nothing.
 inline const std::string& EmptyFolder() {

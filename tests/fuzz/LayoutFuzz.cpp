@@ -12,49 +12,15 @@
 #include <vector>
 
 #include "carrierfiles/Layout.h"
+#include "tests/fuzz/FuzzInput.h"
 
-namespace {
-
-void Check(bool condition) {
-  if (!condition) std::abort();
-}
-
-// The number of values of a delimited line, where double quotes group and
-// a doubled quote inside them stands for one; a tab always separates.
-std::size_t Columns(std::string_view line, char delimiter) {
-  std::size_t columns = 1;
-  if (delimiter == '\t') return columns + static_cast<std::size_t>(std::count(line.begin(), line.end(), '\t'));
-  bool quoted = false;
-  bool start = true;
-  for (std::size_t i = 0; i < line.size(); ++i) {
-    const char c = line[i];
-    if (quoted && c == '"' && i + 1 < line.size() && line[i + 1] == '"') {
-      ++i;
-    } else if (c == '"' && (quoted || start)) {
-      quoted = !quoted;
-    } else if (c == delimiter && !quoted) {
-      ++columns;
-      start = true;
-      continue;
-    }
-    start = false;
-  }
-  Check(!quoted);
-  return columns;
-}
-
-}  // namespace
+using quendal::fuzz::Check;
 
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
   if (size == 0) return 0;
-  // The first byte gives the length of a value taken from the end of the
-  // input (0: a value with delimiters, quotes and a line break), handed to
-  // every computed text value; the bytes between are the layout file.
-  const std::string_view input(reinterpret_cast<const char*>(data) + 1, size - 1);
-  const std::size_t length = std::min<std::size_t>(data[0] % 17, input.size());
-  const std::string_view bytes = input.substr(0, input.size() - length);
-  const std::string value =
-      length == 0 ? std::string("a,\"b\"\t;|\r\n") : std::string(input.substr(input.size() - length));
+  // The layout file, and a value (by default with delimiters, quotes and a
+  // line break) handed to every computed text value.
+  const auto [bytes, value] = quendal::fuzz::SplitInput(data, size, "a,\"b\"\t;|\r\n");
 
   const quendal::LayoutRead read = quendal::ReadLayout(bytes);
   if (!read.layout) {
@@ -81,7 +47,7 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
     if (record.fields.empty())
       Check(line.empty());
     else if (layout.delimited)
-      Check(Columns(line, layout.delimiter) == record.fields.size());
+      Check(quendal::fuzz::DelimitedValues(line, layout.delimiter).size() == record.fields.size());
   }
   return 0;
 }

@@ -143,6 +143,12 @@ bool ConsignmentWriter::CheckFolder(const std::string& folder) {
   return false;
 }
 
+bool ConsignmentWriter::HasFolder(const std::string& folder) {
+  if (!folder.empty()) return true;
+  LogLine(0, "Open carrier message file", "Invalid folder " + folder);
+  return false;
+}
+
 std::string ConsignmentWriter::CarrierLine(std::string_view utf8) {
   return ToCodePage(utf8) + "\r\n";
 }

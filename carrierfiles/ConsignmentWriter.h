@@ -71,6 +71,11 @@ class ConsignmentWriter : public Lifecycle, public ConsignmentInterface {
   // A carrier folder must exist and end with the folder separator; an
   // invalid one is logged ("Invalid folder ") and false returned.
   bool CheckFolder(const std::string& folder);
+  // The classes that take the folder text as it stands still need one: an
+  // empty text would put the day file in the process's working directory,
+  // where no carrier transfer looks. It is logged ("Invalid folder ") and
+  // false returned.
+  bool HasFolder(const std::string& folder);
 
   // The carrier file of the current call.
   AppendingFile& File() { return file_; }

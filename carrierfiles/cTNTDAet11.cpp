@@ -215,9 +215,11 @@ void clsTNTDAet11::Compile(const Ref<host::ConNote>& objConNote, const Ref<host:
         no = objConNote->ConNoteNo().Text();
         carrier = objConNote->Carrier();
         folder = Read(carrier, &host::Carrier::FileFolder).Text();
+        if (!HasFolder(folder)) return false;
         // One file per account and day; the folder text ends with its separator.
         path = folder + SafeNamePart(Read(carrier, &host::Carrier::AccountRef).Text()) +
                Format(Var(Today()), "DDMM") + "1200.TXT";
+        return true;
       }))
     return;
 

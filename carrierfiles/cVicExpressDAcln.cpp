@@ -66,6 +66,7 @@ void clsVicExpressDAcln::Compile(const Ref<host::ConNote>& objConNote, const Ref
         no = objConNote->ConNoteNo().Text();
         carrier = objConNote->Carrier();
         folder = Read(carrier, &host::Carrier::FileFolder).Text();
+        return HasFolder(folder);
       }))
     return;
 

@@ -82,6 +82,15 @@ void eParcelRows::FillRow(Grid& rows, std::size_t row, const Ref<host::ConNote>&
 std::int32_t eParcelRows::ProcessRow(Procedure& proc, const Ref<host::ConNote>& conNote,
                                      LogList& vtErrorLog) {
   std::int32_t result = 0;
+  // Without a folder text the day's file and the run's journal would go to
+  // the process's working directory, where no carrier transfer looks.
+  if (!proc([&] {
+        if (!DayFolder().empty()) return true;
+        WriteLog(0, "Open carrier message file", "Invalid folder ");
+        vtErrorLog = {LastLogId()};
+        return false;
+      }))
+    return result;
   if (variant_.manifestRecord) {
     bool saved = false;
     if (!proc([&] { saved = SaveManifestRecord(); })) return result;

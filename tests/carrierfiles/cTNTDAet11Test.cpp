@@ -181,6 +181,17 @@ TEST_F(TNTDAet11Test, AFileThatDoesNotEndInItsTrailerIsLeftAlone) {
   EXPECT_EQ(host.logs[0].at("Procedure").Text(), "Open carrier message file");
 }
 
+TEST_F(TNTDAet11Test, WithoutAFolderTextNothingIsWritten) {
+  test::WorkingDirectory cwd(folder + "cwd");
+  for (const Var& none : {Var(""), Var()}) {
+    carrier->fields["FileFolder"] = none;
+    Process(ConNote(102, "TNT00012346", 1));
+    EXPECT_EQ(host.LogMessages().back(), "Invalid folder ");
+    EXPECT_EQ(host.logs.back().at("Procedure").Text(), "Open carrier message file");
+  }
+  EXPECT_TRUE(cwd.Entries().empty());
+}
+
 TEST_F(TNTDAet11Test, AFailedWriteLeavesTheDayFileAndACrashedOneIsCompleted) {
   Process(ConNote(102, "TNT00012346", 1));
   const std::string one = File();

@@ -156,6 +156,15 @@ TEST_F(VicExpressDAclnTest, PacksWithoutWeightAnEmptyPackListAndAMissingFolder) 
   Process("VEX4", {Pack("00093123450000100279", "CTN01", 2)});
   EXPECT_EQ(host.LogMessages().back(), "Cannot open file " + temp.path() + "/missing/");
   EXPECT_EQ(host.logs.back().at("Procedure").Text(), "Open carrier message file");
+
+  // No folder text: nothing goes to the working directory.
+  test::WorkingDirectory cwd(folder + "cwd");
+  for (const Var& none : {Var(""), Var()}) {
+    carrier->fields["FileFolder"] = none;
+    Process("VEX5", {Pack("00093123450000100286", "CTN01", 2)});
+    EXPECT_EQ(host.LogMessages().back(), "Invalid folder ");
+  }
+  EXPECT_TRUE(cwd.Entries().empty());
 }
 
 // A process killed at any moment while it adds consignments leaves the

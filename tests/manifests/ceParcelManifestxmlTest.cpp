@@ -282,6 +282,21 @@ TEST_F(eParcelManifestTest, AConsignmentThatCannotBeKeptUntilTermIsNeitherStampe
                                            folder + "missing/; it is not added.");
   EXPECT_EQ(conNote->Get("ManifestId").NumberOr(0), 0);
   EXPECT_TRUE(rows->Term());  // nothing to write
+
+  // Without a folder text nothing goes to the working directory, and no
+  // manifest record is made for a file that is never written.
+  test::WorkingDirectory cwd(folder + "cwd");
+  for (const Var& none : {Var(""), Var()}) {
+    carrier->fields["FileFolder"] = none;
+    auto again = CreateObject(kManifestClass).object;
+    RowInterface* run = Loaded(again);
+    EXPECT_EQ(run->Process(0, log), 0);
+    EXPECT_EQ(host.LogMessages().back(), "Invalid folder ");
+    EXPECT_EQ(host.logs.back().at("Procedure").Text(), "Open carrier message file");
+    EXPECT_TRUE(run->Term());
+  }
+  EXPECT_EQ(conNote->Get("ManifestId").NumberOr(0), 0);
+  EXPECT_TRUE(cwd.Entries().empty());
 }
 
 TEST_F(eParcelManifestTest, NothingIsWrittenWithoutAConsignmentInTheDocument) {

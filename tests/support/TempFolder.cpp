@@ -24,6 +24,25 @@ TempFolder::~TempFolder() {
   std::filesystem::remove_all(path_, ec);
 }
 
+WorkingDirectory::WorkingDirectory(const std::string& path)
+    : path_(path), previous_(std::filesystem::current_path().string()) {
+  std::filesystem::create_directories(path);
+  std::filesystem::current_path(path);
+}
+
+WorkingDirectory::~WorkingDirectory() {
+  std::error_code ec;
+  std::filesystem::current_path(previous_, ec);
+}
+
+std::vector<std::string> WorkingDirectory::Entries() const {
+  std::vector<std::string> names;
+  std::error_code ec;
+  for (const auto& entry : std::filesystem::directory_iterator(path_, ec))
+    names.push_back(entry.path().filename().string());
+  return names;
+}
+
 std::string ReadText(const std::string& path) {
   std::ifstream in(path, std::ios::binary);
   std::ostringstream out;

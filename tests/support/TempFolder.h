@@ -2,6 +2,7 @@
 #pragma once
 
 #include <string>
+#include <vector>
 
 namespace quendal::test {
 
@@ -16,6 +17,23 @@ class TempFolder {
 
  private:
   std::string path_;
+};
+
+// Makes a folder (created when missing) the process's working directory
+// until the end of the scope, so that a file written where no folder points
+// lands where a test can see it.
+class WorkingDirectory {
+ public:
+  explicit WorkingDirectory(const std::string& path);
+  ~WorkingDirectory();
+  WorkingDirectory(const WorkingDirectory&) = delete;
+  WorkingDirectory& operator=(const WorkingDirectory&) = delete;
+  // The names of the files and folders in it.
+  std::vector<std::string> Entries() const;
+
+ private:
+  std::string path_;
+  std::string previous_;
 };
 
 // The text of a file (empty when it can't be read).

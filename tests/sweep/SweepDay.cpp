@@ -317,6 +317,9 @@ Outcome SweepDay::RunIn(const CatalogueEntry& entry, Sweep& sweep, const Seed& s
   auto prompt = std::make_shared<ScriptedPrompt>();
   {
     PromptScope scope(prompt);
+    // A file written where no folder points lands in the run's folder, where
+    // the check sees it as a file outside the carrier folder.
+    WorkingDirectory cwd((run / "cwd").string());
     // The caller's own reads go to the host directly, so that only the class's reads are swept.
     const auto conNote = host->Find<host::ConNote>("ConNote", conNoteId);
     const Ref<host::PackList> packs = conNote->Packs();

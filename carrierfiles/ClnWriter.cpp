@@ -310,6 +310,8 @@ bool ClnWriter::Write(Procedure& proc, const ClnConsignment& c,
   if (!proc([&] { owner_.LogLine(0, kProcess, "ConNote " + no + " compile Started."); })) return false;
 
   const std::string header = records;  // a retried step starts again from here
+  // The consignment's own records must keep their widths.
+  record::FitCheck fit;
   std::int32_t packCount = 0;
   if (!proc([&] { packCount = lstPacks ? lstPacks->Count() : 0; })) return false;
   if (!proc([&] {
@@ -394,6 +396,12 @@ bool ClnWriter::Write(Procedure& proc, const ClnConsignment& c,
       return false;
   }
 
+  if (!proc([&] {
+        if (fit.Fits()) return true;
+        owner_.LogLine(0, kOpenFile, fit.Refusal(no));
+        return false;
+      }))
+    return false;
   // The consignment goes into the file in one write, so the file never holds part of it.
   if (!proc([&] {
         const auto before = file_.Stamp();

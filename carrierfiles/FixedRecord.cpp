@@ -84,6 +84,11 @@ std::string Render(std::span<const Field> layout, std::span<const Var> values) {
     // A missing date or number keeps its place in the record as spaces.
     if (text.empty() && (field.kind == Kind::Date || field.kind == Kind::Number))
       text = quendal::Spaces(field.width);
+    // A field of width 0 takes its value as it stands (the end of a line).
+    if (field.width > 0) {
+      const long length = Len(text);
+      if (length > field.width) FitCheck::Note(text, length, field.width);
+    }
     line += text;
   }
   return line;
@@ -106,6 +111,28 @@ std::string RenderDelimited(std::span<const Field> layout, std::span<const Var> 
       AppendCsvValue(line, text, delimiter);
   }
   return line;
+}
+
+namespace {
+thread_local FitCheck* openCheck = nullptr;
+}  // namespace
+
+FitCheck::FitCheck() : previous_(openCheck) { openCheck = this; }
+
+FitCheck::~FitCheck() { openCheck = previous_; }
+
+void FitCheck::Note(std::string_view text, long length, int width) {
+  if (!openCheck || openCheck->overlong_) return;
+  constexpr long kShown = 20;
+  std::string start = Left(text, kShown);
+  if (length > kShown) start += "...";
+  openCheck->overlong_ = Found{std::move(start), length, width};
+}
+
+std::string FitCheck::Refusal(std::string_view conNoteNo) const {
+  if (!overlong_) return {};
+  return "ConNote " + Left(conNoteNo, 40) + " not added: a value of " + std::to_string(overlong_->length) + " characters (\"" + overlong_->start +
+         "\") is longer than its field of " + std::to_string(overlong_->width);
 }
 
 }  // namespace quendal::record

@@ -7,13 +7,15 @@
 //   std::string line = Render(kItem, {conNoteNo, sscc});
 //
 // Fill rules never cut: a value longer than its field is written whole and
-// shifts the rest of the line. Only CutLeft and CutRight take the first
-// characters. A delimited record joins the filled fields with a delimiter
+// shifts the rest of the line, and a FitCheck open on the thread notes it
+// so that the writer can refuse the record instead. Only CutLeft and
+// CutRight take the first characters. A delimited record joins the filled fields with a delimiter
 // instead of setting them side by side.
 #pragma once
 
 #include <cstdint>
 #include <initializer_list>
+#include <optional>
 #include <span>
 #include <string>
 #include <string_view>
@@ -91,5 +93,35 @@ std::string RenderDelimited(std::span<const Field> layout, std::span<const Var> 
 
 // One field on its own, for values that are put together before they go in.
 std::string Fill(const Field& field, const Var& value);
+
+// While it lives, notes the first value that Render on this thread found
+// longer than its field. A writer of a fixed-width file opens one around
+// the records of a consignment and refuses the consignment when one was
+// found: the longer value would shift every field after it and the carrier
+// would misread the record, and a reference must not be cut to fit.
+class FitCheck {
+ public:
+  FitCheck();
+  ~FitCheck();
+  FitCheck(const FitCheck&) = delete;
+  FitCheck& operator=(const FitCheck&) = delete;
+
+  bool Fits() const { return !overlong_.has_value(); }
+  // The log text of a consignment refused for the first value that did not
+  // fit: its length, its field's width and its first characters.
+  std::string Refusal(std::string_view conNoteNo) const;
+
+  // Called by Render for a value of `length` characters in a field of `width`.
+  static void Note(std::string_view text, long length, int width);
+
+ private:
+  struct Found {
+    std::string start;
+    long length = 0;
+    int width = 0;
+  };
+  std::optional<Found> overlong_;
+  FitCheck* previous_;
+};
 
 }  // namespace quendal::record

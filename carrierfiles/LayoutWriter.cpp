@@ -193,12 +193,13 @@ bool LayoutWriter::Write(Procedure& proc, const LayoutConsignment& c,
     return text;
   };
 
-  std::string records;
-  if (!proc([&] {
-        records = newFile ? lines(RecordWhen::Header, nullptr, 0) : std::string();
-        records += lines(RecordWhen::Consignment, nullptr, 0);
-      }))
+  std::string header;
+  if (!proc([&] { header = newFile ? lines(RecordWhen::Header, nullptr, 0) : std::string(); }))
     return false;
+  // The consignment's own records must keep their widths.
+  record::FitCheck fit;
+  std::string records;
+  if (!proc([&] { records = header + lines(RecordWhen::Consignment, nullptr, 0); })) return false;
   if (layout->Has(RecordWhen::Pack)) {
     const std::int32_t first = c.onlyPack > 0 ? c.onlyPack : 1;
     const std::int32_t last = c.onlyPack > 0 ? std::min(c.onlyPack, values.packCount) : values.packCount;
@@ -212,6 +213,13 @@ bool LayoutWriter::Write(Procedure& proc, const LayoutConsignment& c,
         return false;
     }
   }
+
+  if (!proc([&] {
+        if (fit.Fits()) return true;
+        owner_.LogLine(0, kOpenFile, fit.Refusal(no));
+        return false;
+      }))
+    return false;
 
   if (!layout->Has(RecordWhen::Trailer)) {
     // The consignment goes into the file in one write, so the file never holds part of it.

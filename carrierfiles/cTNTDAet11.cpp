@@ -288,6 +288,8 @@ void clsTNTDAet11::Compile(const Ref<host::ConNote>& objConNote, const Ref<host:
       }))
     return;
 
+  // The consignment's own records must keep their widths.
+  record::FitCheck fit;
   std::string body;
   std::uint64_t lines = 0;
   if (!proc([&] {
@@ -334,6 +336,13 @@ void clsTNTDAet11::Compile(const Ref<host::ConNote>& objConNote, const Ref<host:
         }
         body += items;
         lines += static_cast<std::uint64_t>(sequence);
+      }))
+    return;
+
+  if (!proc([&] {
+        if (fit.Fits()) return true;
+        LogLine(0, kOpenFile, fit.Refusal(no));
+        return false;
       }))
     return;
 

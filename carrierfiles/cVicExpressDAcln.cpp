@@ -119,6 +119,9 @@ void clsVicExpressDAcln::Compile(const Ref<host::ConNote>& objConNote, const Ref
       }))
     return;
 
+  // The consignment's own records must keep their widths; the header's
+  // logical name is written whole by design.
+  record::FitCheck fit;
   // The consignment record goes with the first pack, so a consignment
   // without packs writes nothing of its own.
   std::int32_t packCount = 0;
@@ -159,6 +162,12 @@ void clsVicExpressDAcln::Compile(const Ref<host::ConNote>& objConNote, const Ref
       return;
   }
 
+  if (!proc([&] {
+        if (fit.Fits()) return true;
+        LogLine(0, "Open carrier message file", fit.Refusal(no));
+        return false;
+      }))
+    return;
   // The consignment goes into the file in one write, so the file never holds part of it.
   if (!proc([&] {
         if (!File().Append(records)) throw Error(err::kDeviceIO);

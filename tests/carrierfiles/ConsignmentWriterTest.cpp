@@ -180,5 +180,29 @@ TEST(FixedRecordTest, FieldsPadButNeverCutUnlessAskedAndMissingDatesKeepTheirWid
   EXPECT_EQ(RenderDelimited(number, std::vector<Var>{1.5, Var()}, ','), "W,0001.50,");
 }
 
+TEST(FixedRecordTest, AFitCheckNotesTheFirstValueLongerThanItsField) {
+  using namespace record;
+  constexpr std::array layout = {Literal("15"), TextLeft(4), CutLeft(2), Zero(3), TextLeft(0)};
+  FitCheck fit;
+  // Cut fields, a free-length tail and values that fit are not noted.
+  Render(layout, {"ABCD", "XYZ", 999, std::string(50, 'T')});
+  EXPECT_TRUE(fit.Fits());
+  {
+    FitCheck inner;  // a check opened inside another notes for itself alone
+    Render(layout, {"AB", "", 1000});
+    EXPECT_EQ(inner.Refusal("C1"),
+              "ConNote C1 not added: a value of 4 characters (\"1000\") is longer than its field of 3");
+  }
+  EXPECT_TRUE(fit.Fits());
+  Render(layout, {std::string(10000, 'N')});
+  Render(layout, {"ABCDE"});
+  EXPECT_EQ(fit.Refusal("C2"), "ConNote C2 not added: a value of 10000 characters (\"" +
+                                   std::string(20, 'N') + "...\") is longer than its field of 4");
+  // Delimited records have no widths to keep.
+  FitCheck delimited;
+  RenderDelimited(layout, std::vector<Var>{"ABCDEFG"}, ',');
+  EXPECT_TRUE(delimited.Fits());
+}
+
 }  // namespace
 }  // namespace quendal

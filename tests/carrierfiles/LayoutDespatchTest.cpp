@@ -141,6 +141,20 @@ TEST_F(LayoutDespatchTest, Ipec1250WritesItsDayFileAndMovesTheTrailer) {
                           item("IPE00012347", 1), item("IPE00012347", 2), "20240314", "%%EOF"));
 }
 
+// A number too large for its field would shift the rest of the record: the
+// consignment is refused, and the file keeps its trailer.
+TEST_F(LayoutDespatchTest, ANumberLongerThanItsFieldRefusesTheConsignment) {
+  clsIpecDA1250 cls;
+  Process(cls, ConNote("IPE00012346"));
+  const std::string name = "T1250_IPE__20240314093000.DAT";
+  const std::vector<std::string> before = Lines(name);
+  Process(cls, ConNote("IPE00012347", 123456));
+  EXPECT_EQ(Lines(name), before);
+  EXPECT_EQ(host.LogMessages().back(),
+            "ConNote IPE00012347 not added: a value of 8 characters (\"123456.0\") is longer than "
+            "its field of 6");
+}
+
 TEST_F(LayoutDespatchTest, Ipec1256Mayne) {
   clsIpecDA1256 ipec;
   Process(ipec, ConNote("IPE00012346", 12.5, "priority service"));

@@ -74,7 +74,7 @@ class StationsTest : public ::testing::TestWithParam<Writer> {
     std::snprintf(no, sizeof no, "SRXZ%08d", n);
     auto conNote = host_.Make<host::ConNote>({{"ConNoteNo", no},
                                               {"ConNoteDate", Now()},
-                                              {"Service", "EXPRESS"},
+                                              {"Service", "EXP"},  // a code of the CLN file's three characters
                                               {"Weight", 12.5},
                                               {"Volume", 0.035},
                                               {"Carrier", carrier_},

@@ -200,6 +200,20 @@ TEST_F(StarTrackDAclnTest, SecondConsignmentIsAppendedAndARepeatedNumberIsRefuse
   EXPECT_THAT(log, ElementsAre(41, 42, id(1), id(2), id(3)));
 }
 
+// A reference is never cut to fit, and a longer one would shift every
+// field after it: the consignment is refused whole.
+TEST_F(StarTrackDAclnTest, AValueLongerThanItsFieldRefusesTheConsignment) {
+  Process(ConNote(kNo, 1));
+  const std::string day = File("SRX00501.CLN");
+  const std::string no = "SRXZ" + std::string(10000, '7');
+  Process(ConNote(no, 1));
+  EXPECT_EQ(File("SRX00501.CLN"), day);
+  EXPECT_EQ(host.LogMessages().back(), "ConNote " + no.substr(0, 40) +
+                                           " not added: a value of 10004 characters (\"SRXZ" +
+                                           std::string(16, '7') + "...\") is longer than its field of 20");
+  EXPECT_EQ(host.logs.back().at("Procedure").Text(), "Open carrier message file");
+}
+
 TEST_F(StarTrackDAclnTest, AConsignmentAnotherWriterAddedIsStillRefused) {
   Process(ConNote(kNo, 1));
   // Another program adds a consignment to the same day's file.

@@ -181,6 +181,19 @@ TEST_F(TNTDAet11Test, AFileThatDoesNotEndInItsTrailerIsLeftAlone) {
   EXPECT_EQ(host.logs[0].at("Procedure").Text(), "Open carrier message file");
 }
 
+// A longer value would shift the rest of its record: the consignment is
+// refused, and the batch keeps its trailer.
+TEST_F(TNTDAet11Test, AValueLongerThanItsFieldRefusesTheConsignment) {
+  Process(ConNote(102, "TNT00012346", 1));
+  const std::string before = File();
+  receiver->fields["AddressLine2"] = std::string(31, 'S');
+  Process(ConNote(103, "TNT00012347", 1));
+  EXPECT_EQ(File(), before);
+  EXPECT_EQ(host.LogMessages().back(),
+            "ConNote TNT00012347 not added: a value of 31 characters (\"" + std::string(20, 'S') +
+                "...\") is longer than its field of 30");
+}
+
 TEST_F(TNTDAet11Test, WithoutAFolderTextNothingIsWritten) {
   test::WorkingDirectory cwd(folder + "cwd");
   for (const Var& none : {Var(""), Var()}) {

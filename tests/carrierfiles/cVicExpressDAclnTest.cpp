@@ -157,6 +157,15 @@ TEST_F(VicExpressDAclnTest, PacksWithoutWeightAnEmptyPackListAndAMissingFolder) 
   EXPECT_EQ(host.LogMessages().back(), "Cannot open file " + temp.path() + "/missing/");
   EXPECT_EQ(host.logs.back().at("Procedure").Text(), "Open carrier message file");
 
+  // A consignment number longer than its field is refused.
+  carrier->fields["FileFolder"] = folder;
+  const std::string day = File(Name(today));
+  Process(std::string(21, '9'), {Pack("00093123450000100286", "CTN01", 2)});
+  EXPECT_EQ(File(Name(today)), day);
+  EXPECT_EQ(host.LogMessages().back(), "ConNote " + std::string(21, '9') +
+                                           " not added: a value of 21 characters (\"" +
+                                           std::string(20, '9') + "...\") is longer than its field of 20");
+
   // No folder text: nothing goes to the working directory.
   test::WorkingDirectory cwd(folder + "cwd");
   for (const Var& none : {Var(""), Var()}) {

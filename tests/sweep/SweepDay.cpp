@@ -152,9 +152,9 @@ std::vector<std::string> FileFaults(const std::string& path, const std::string& 
                          std::to_string(tagged->second));
     } else if (!shape.delimiter) {
       auto it = shape.widths.find(l.substr(0, 2));
-      // Values are never cut, so an over-long one lengthens its record; a
-      // record shorter than its width has lost a field's place.
-      if (it != shape.widths.end() && l.size() < it->second)
+      // A record shorter than its width has lost a field's place; a longer
+      // one shifts every field after the value that did not fit.
+      if (it != shape.widths.end() && l.size() != it->second)
         faults.push_back(path + " line " + std::to_string(line) + ": record " + it->first + " is " +
                          std::to_string(l.size()) + " wide, not " + std::to_string(it->second));
     }

@@ -455,7 +455,7 @@ std::string CairoPrintDocument::Show() {
     path = fs::path(impl_->outputFile).replace_extension(".pdf").string();
   } else {
     std::error_code ec;
-    path = (fs::temp_directory_path(ec) / ("quendal-" + SafeFileName(impl_->title) + ".pdf")).string();
+    path = (fs::temp_directory_path(ec) / ("quendal-" + TitleForFileName(impl_->title) + ".pdf")).string();
   }
   return ReplaceFile(path, pdf_) ? path : std::string();
 }

@@ -43,6 +43,17 @@ std::string SafeNamePart(std::string_view text) {
   return text.empty() ? std::string() : SafeFileName(text);
 }
 
+std::string TitleForFileName(std::string_view title) {
+  constexpr std::size_t kMostBytes = 100;
+  std::string name = SafeFileName(title);
+  if (name.size() <= kMostBytes) return name;
+  std::size_t cut = kMostBytes;
+  // Back to the start of a UTF-8 character: continuation bytes are 10xxxxxx.
+  while (cut > 0 && (static_cast<unsigned char>(name[cut]) & 0xC0) == 0x80) --cut;
+  name.resize(cut);
+  return name;
+}
+
 DirectorySpooler::DirectorySpooler(std::string root) : root_(std::move(root)) {}
 
 std::string DirectorySpooler::PrinterFolder(const std::string& name) const {
@@ -111,7 +122,7 @@ std::string DirectorySpooler::NextJobPath(const std::string& name, const std::st
   ReplaceFile(counterPath, std::to_string(next));
   char number[32];
   std::snprintf(number, sizeof number, "%06ld", next);
-  return (fs::path(folder) / (std::string(number) + "-" + SafeFileName(documentName) + "." + extension))
+  return (fs::path(folder) / (std::string(number) + "-" + TitleForFileName(documentName) + "." + extension))
       .string();
 }
 

@@ -97,5 +97,10 @@ std::string SafeFileName(std::string_view name);
 // own; an empty piece stays empty. Build a name from safe pieces and fixed
 // parts, so that no host text can reach into the extension or the folder.
 std::string SafeNamePart(std::string_view text);
+// A document's title as a part of a file name that only tells people what
+// the file holds (a spooled job, a drawn page): made safe, and cut to at
+// most 100 bytes of whole characters, so that a long title can't make a
+// name the file system refuses.
+std::string TitleForFileName(std::string_view title);
 
 }  // namespace quendal

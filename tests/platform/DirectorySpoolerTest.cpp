@@ -45,6 +45,12 @@ TEST_F(DirectorySpoolerTest, OneFilePerJobWithTheBytesAsSent) {
             "{B,430,N,1|\xC8}");
   EXPECT_TRUE(FileExists((root / "Dock Zebra/000002-a____b.prn").string()));
   EXPECT_FALSE(spooler.Write(h, "x"));  // closed
+
+  // A title too long for a file name still queues its job.
+  const auto again = spooler.OpenPrinter("Dock Zebra", error);
+  ASSERT_NE(spooler.StartDoc(again, std::string(10000, 'T')), 0);
+  ASSERT_TRUE(spooler.EndDoc(again));
+  EXPECT_TRUE(FileExists((root / ("Dock Zebra/000003-" + std::string(100, 'T') + ".prn")).string()));
 }
 
 TEST_F(DirectorySpoolerTest, UnknownPrintersAreError1801) {
@@ -99,6 +105,10 @@ TEST(SafeFileNameTest, KeepsNamesInsideTheFolder) {
   EXPECT_EQ(SafeFileName("../../etc/passwd"), "______etc_passwd");
   EXPECT_EQ(SafeFileName("a\\b:c"), "a_b_c");
   EXPECT_EQ(SafeFileName(""), "_");
+  // A title only names the file for people: it is cut to whole characters.
+  EXPECT_EQ(TitleForFileName("Label a/b"), "Label a_b");
+  EXPECT_EQ(TitleForFileName(std::string(99, 'x') + "é" + "tail"), std::string(99, 'x'));
+  EXPECT_EQ(TitleForFileName(std::string(10000, 'x')), std::string(100, 'x'));
 }
 
 // A process killed at any moment while it prints leaves only whole jobs,

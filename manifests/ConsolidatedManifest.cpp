@@ -225,9 +225,14 @@ std::int16_t ConsolidatedManifestRows::ConsolidatedManifestPrint(
 
 bool ConsolidatedManifestRows::PrintTodaysSummary() {
   const std::string today = Format(Var(Today()), "Short Date");
-  const std::int16_t result =
-      ConsolidatedManifestPrint(today, today, Read(vendor_, &host::Vendor::VendorCode).Text(),
-                                Read(carrier_, &host::Carrier::CarrierCode).Text(), 1, "");
+  const std::string vendor = Read(vendor_, &host::Vendor::VendorCode).Text();
+  const std::string carrier = Read(carrier_, &host::Carrier::CarrierCode).Text();
+  const std::int16_t result = ConsolidatedManifestPrint(today, today, vendor, carrier, 1, "");
+  // The driver signs the summary at pickup: a run that ends without one says so.
+  if (result == kNoList || result == kEmptyList)
+    WriteLog(0, "Term",
+             std::string(kTitle) + ": the host found no consignments of vendor \"" + vendor +
+                 "\" and carrier \"" + carrier + "\" for " + today + "; nothing was printed.");
   return result != kNotProduced;
 }
 

@@ -4,6 +4,7 @@
 #include <gtest/gtest.h>
 
 #include "carrierfiles/cStarTrackDAcln.h"
+#include "frame/VB.h"
 #include "tests/manifests/StarTrackRowsFixture.h"
 
 namespace quendal {
@@ -92,6 +93,17 @@ TEST_F(StarTrackEndOfDayTest, TermSumsUpTodaysConsignments) {
   EXPECT_FALSE(run.rows->Term());
   EXPECT_EQ(host.LogMessages().back(),
             "Consignment Summary Print could not be printed on \"Nowhere\".");
+
+  // The host finds no consignment of the run's vendor and carrier (the
+  // consignments' vendor has lost its code): nothing to print, and the log says so.
+  vendor->fields["VendorCode"] = Var();
+  const std::size_t jobs = SummaryJobs().size();
+  EXPECT_TRUE(run.rows->Term());
+  EXPECT_EQ(SummaryJobs().size(), jobs);
+  EXPECT_EQ(host.LogMessages().back(),
+            "Consignment Summary Print: the host found no consignments of vendor \"ALP\" and carrier "
+            "\"STE\" for " + Format(Var(Today()), "Short Date") + "; nothing was printed.");
+  EXPECT_EQ(host.logs.back().at("Procedure").Text(), "Term");
 }
 
 }  // namespace

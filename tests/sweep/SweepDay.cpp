@@ -393,6 +393,39 @@ std::vector<std::string> SweepDay::Check(const CatalogueEntry& entry, const Outc
     if (!model) continue;
     for (auto& f : FileFaults(path, text, ShapeOf(path, *model))) faults.push_back(Printable(f));
   }
+  // A run that leaves out what the clean run wrote or printed says why: in
+  // the log, or in an error report.
+  const FileMap& before = seed != seeds_.end() ? seed->second.files : day_.files;
+  const auto wrote = [&](const Outcome& outcome) {
+    for (const auto& [path, text] : outcome.files) {
+      if (fs::path(path).filename().string().starts_with(".")) continue;
+      const auto it = before.find(path);
+      if (it == before.end() || it->second != text) return true;
+    }
+    return false;
+  };
+  // Whether a consignment carries dangerous goods is read from data the
+  // sweep makes Null, so a declaration may rightly be left out.
+  const auto documents = [](const Outcome& outcome) {
+    return std::count_if(outcome.jobs.begin(), outcome.jobs.end(), [](const auto& job) {
+      return !job.document.starts_with("DANGEROUS GOODS SHIPPING/TRANSPORT DOCUMENT");
+    });
+  };
+  if (((wrote(clean) && !wrote(run)) || documents(run) < documents(clean)) &&
+      run.prompts.empty()) {
+    const std::multiset<std::string> cleanLogs(clean.logs.begin(), clean.logs.end());
+    const bool said = std::any_of(run.logs.begin(), run.logs.end(), [&](const std::string& log) {
+      return !cleanLogs.contains(log);
+    });
+    if (!said) {
+      std::string logs;
+      for (const auto& log : run.logs) logs += " / " + log;
+      faults.push_back("left out what the clean run wrote or printed, and said nothing (jobs " +
+                       std::to_string(run.jobs.size()) + " of " + std::to_string(clean.jobs.size()) +
+                       "; files " + (wrote(run) ? "written" : "not written") + "; log" +
+                       Printable(logs) + ")");
+    }
+  }
   for (const auto& job : run.jobs)
     if (!job.bytes.starts_with("%PDF"))
       for (auto& f : StreamFaults(job)) faults.push_back(f);

@@ -272,6 +272,8 @@ void clsTNTDAet11::Compile(const Ref<host::ConNote>& objConNote, const Ref<host:
       }))
     return;
 
+  // Every record must keep its width, the new batch's header records too.
+  record::FitCheck fit;
   std::string header;
   if (!existing && !proc([&] {
         const Ref<host::Vendor> vendor = objConNote->Vendor();
@@ -288,8 +290,6 @@ void clsTNTDAet11::Compile(const Ref<host::ConNote>& objConNote, const Ref<host:
       }))
     return;
 
-  // The consignment's own records must keep their widths.
-  record::FitCheck fit;
   std::string body;
   std::uint64_t lines = 0;
   if (!proc([&] {

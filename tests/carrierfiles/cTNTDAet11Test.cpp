@@ -192,6 +192,18 @@ TEST_F(TNTDAet11Test, AValueLongerThanItsFieldRefusesTheConsignment) {
   EXPECT_EQ(host.LogMessages().back(),
             "ConNote TNT00012347 not added: a value of 31 characters (\"" + std::string(20, 'S') +
                 "...\") is longer than its field of 30");
+
+  // A new batch whose sender record would not keep its width is not started.
+  receiver->fields["AddressLine2"] = "Gate 4";
+  carrier->fields["AccountRef"] = "TNT01-NORTHSIDE";  // 15 characters: fits
+  Process(ConNote(104, "TNT00012348", 1));
+  EXPECT_TRUE(fs::exists(folder + "TNT01-NORTHSIDE14031200.TXT"));
+  carrier->fields["AccountRef"] = "TNT01-SOUTHSIDE2";
+  Process(ConNote(105, "TNT00012349", 1));
+  EXPECT_FALSE(fs::exists(folder + "TNT01-SOUTHSIDE214031200.TXT"));
+  EXPECT_EQ(host.LogMessages().back(),
+            "ConNote TNT00012349 not added: a value of 16 characters (\"TNT01-SOUTHSIDE2\") is "
+            "longer than its field of 15");
 }
 
 TEST_F(TNTDAet11Test, WithoutAFolderTextNothingIsWritten) {

@@ -376,6 +376,9 @@ void clsTNTDAet11::Compile(const Ref<host::ConNote>& objConNote, const Ref<host:
       const std::optional<Trailer> found = FindTrailer(end, batch);
       if (!found || found->count == 0) return std::nullopt;
       previous = found->count - 1;
+      // The new trailer must keep its width too: a count too large for its
+      // field refuses the consignment (the fit check says which).
+      if (trailer(previous + lines + 1); !fit.Fits()) return std::nullopt;
       return found->at;
     };
     const auto build = [&](std::string_view) {
@@ -386,6 +389,10 @@ void clsTNTDAet11::Compile(const Ref<host::ConNote>& objConNote, const Ref<host:
       case TailJournal::Outcome::Replaced:
         return true;
       case TailJournal::Outcome::NoTail:
+        if (!fit.Fits()) {
+          LogLine(0, kOpenFile, fit.Refusal(no));
+          return false;
+        }
         LogLine(0, kOpenFile, "Cannot open file to add consignment " + folder);
         LogLine(0, kOpenFile,
                 "ConNote " + no + " not added: the last line of " + path +

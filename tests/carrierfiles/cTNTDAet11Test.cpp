@@ -193,13 +193,23 @@ TEST_F(TNTDAet11Test, AValueLongerThanItsFieldRefusesTheConsignment) {
             "ConNote TNT00012347 not added: a value of 31 characters (\"" + std::string(20, 'S') +
                 "...\") is longer than its field of 30");
 
-  // A new batch whose sender record would not keep its width is not started.
+  // A batch whose trailer can't count one more consignment takes no more.
   receiver->fields["AddressLine2"] = "Gate 4";
-  carrier->fields["AccountRef"] = "TNT01-NORTHSIDE";  // 15 characters: fits
+  std::string full = before;
+  full.replace(full.size() - 7, 5, "99998");
+  ASSERT_TRUE(ReplaceFile(path, full));
   Process(ConNote(104, "TNT00012348", 1));
+  EXPECT_EQ(File(), full);
+  EXPECT_EQ(host.LogMessages().back(),
+            "ConNote TNT00012348 not added: a value of 6 characters (\"100002\") is longer than "
+            "its field of 5");
+
+  // A new batch whose sender record would not keep its width is not started.
+  carrier->fields["AccountRef"] = "TNT01-NORTHSIDE";  // 15 characters: fits
+  Process(ConNote(105, "TNT00012348", 1));
   EXPECT_TRUE(fs::exists(folder + "TNT01-NORTHSIDE14031200.TXT"));
   carrier->fields["AccountRef"] = "TNT01-SOUTHSIDE2";
-  Process(ConNote(105, "TNT00012349", 1));
+  Process(ConNote(106, "TNT00012349", 1));
   EXPECT_FALSE(fs::exists(folder + "TNT01-SOUTHSIDE214031200.TXT"));
   EXPECT_EQ(host.LogMessages().back(),
             "ConNote TNT00012349 not added: a value of 16 characters (\"TNT01-SOUTHSIDE2\") is "

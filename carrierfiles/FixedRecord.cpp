@@ -131,7 +131,8 @@ void FitCheck::Note(std::string_view text, long length, int width) {
 
 std::string FitCheck::Refusal(std::string_view conNoteNo) const {
   if (!overlong_) return {};
-  return "ConNote " + Left(conNoteNo, 40) + " not added: a value of " + std::to_string(overlong_->length) + " characters (\"" + overlong_->start +
+  return "ConNote " + Left(conNoteNo, 40) + " not added: a value of " +
+         std::to_string(overlong_->length) + " characters (\"" + overlong_->start +
          "\") is longer than its field of " + std::to_string(overlong_->width);
 }
 

@@ -196,7 +196,8 @@ bool LayoutWriter::Write(Procedure& proc, const LayoutConsignment& c,
   std::string header;
   if (!proc([&] { header = newFile ? lines(RecordWhen::Header, nullptr, 0) : std::string(); }))
     return false;
-  // The consignment's own records must keep their widths.
+  // The records the consignment writes (its own, and the trailer that
+  // follows them) must keep their widths; the file's header names the file.
   record::FitCheck fit;
   std::string records;
   if (!proc([&] { records = header + lines(RecordWhen::Consignment, nullptr, 0); })) return false;
@@ -214,6 +215,10 @@ bool LayoutWriter::Write(Procedure& proc, const LayoutConsignment& c,
     }
   }
 
+  std::string trailer;
+  if (layout->Has(RecordWhen::Trailer) &&
+      !proc([&] { trailer = lines(RecordWhen::Trailer, nullptr, 0); }))
+    return false;
   if (!proc([&] {
         if (fit.Fits()) return true;
         owner_.LogLine(0, kOpenFile, fit.Refusal(no));
@@ -234,8 +239,6 @@ bool LayoutWriter::Write(Procedure& proc, const LayoutConsignment& c,
         }))
       return false;
   } else {
-    std::string trailer;
-    if (!proc([&] { trailer = lines(RecordWhen::Trailer, nullptr, 0); })) return false;
     // The consignment goes where the file's trailer starts (at its end when
     // it has none) and the trailer after it, in one journalled write.
     const std::size_t trailerLines = layout->Count(RecordWhen::Trailer);

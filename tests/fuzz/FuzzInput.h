@@ -6,6 +6,7 @@
 #include <algorithm>
 #include <cstddef>
 #include <cstdint>
+#include <cstdio>
 #include <cstdlib>
 #include <string>
 #include <string_view>
@@ -13,8 +14,13 @@
 
 namespace quendal::fuzz {
 
-inline void Check(bool condition) {
-  if (!condition) std::abort();
+// Names the failed check's line, so a crash input found by a long run says
+// which promise it broke.
+// (The builtins, not std::source_location, which this clang lacks with libstdc++ 12.)
+inline void Check(bool condition, const char* file = __builtin_FILE(), int line = __builtin_LINE()) {
+  if (condition) return;
+  std::fprintf(stderr, "check failed at %s:%d\n", file, line);
+  std::abort();
 }
 
 // A file and a value taken from one input: its first byte gives the length

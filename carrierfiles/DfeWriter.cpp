@@ -101,10 +101,9 @@ std::unique_ptr<DayDocument> ParseDay(std::string_view bytes) {
   const std::string encoding = DeclaredEncoding(bytes);
   if (!encoding.empty() && encoding != "utf-8" && encoding != "utf8") return nullptr;
   auto day = std::make_unique<DayDocument>();
-  const pugi::xml_parse_result parsed = day->xml.load_buffer(
-      bytes.data(), bytes.size(),
-      pugi::parse_default | pugi::parse_comments | pugi::parse_pi | pugi::parse_ws_pcdata_single,
-      pugi::encoding_auto);
+  const pugi::xml_parse_result parsed = xml::LoadDayFile(
+      day->xml, bytes,
+      pugi::parse_default | pugi::parse_comments | pugi::parse_pi | pugi::parse_ws_pcdata_single);
   if (!parsed || parsed.encoding != pugi::encoding_utf8) return nullptr;
   for (pugi::xml_node top : day->xml.children()) {
     if (top.type() != pugi::node_element) continue;

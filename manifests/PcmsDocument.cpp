@@ -102,8 +102,7 @@ std::unique_ptr<Document> Document::Parse(std::string_view bytes) {
   // Whitespace that is an element's whole text is kept, so a written value
   // of spaces reads back as it was.
   const pugi::xml_parse_result parsed =
-      xml->load_buffer(bytes.data(), bytes.size(),
-                       pugi::parse_default | pugi::parse_ws_pcdata_single, pugi::encoding_auto);
+      xml::LoadDayFile(*xml, bytes, pugi::parse_default | pugi::parse_ws_pcdata_single);
   if (!parsed) return nullptr;
   pugi::xml_node root;
   for (pugi::xml_node top : xml->children()) {

@@ -1,5 +1,7 @@
 #include "manifests/XmlWriting.h"
 
+#include <optional>
+
 namespace quendal::xml {
 
 namespace {
@@ -77,6 +79,47 @@ void CrLfWriter::write(const void* data, std::size_t size) {
 void AppendIndented(std::string& out, pugi::xml_node node, unsigned depth) {
   CrLfWriter writer(out);
   node.print(writer, kIndent, kFormat, pugi::encoding_utf8, depth);
+}
+
+namespace {
+
+// Where the first NUL character is, reading `bytes` in code units of `unit` bytes.
+std::optional<std::size_t> FirstNul(std::string_view bytes, std::size_t unit) {
+  for (std::size_t at = 0; at + unit <= bytes.size(); at += unit)
+    if (bytes.substr(at, unit).find_first_not_of('\0') == std::string_view::npos) return at;
+  return std::nullopt;
+}
+
+std::size_t UnitOf(pugi::xml_encoding encoding) {
+  switch (encoding) {
+    case pugi::encoding_utf16_le:
+    case pugi::encoding_utf16_be:
+    case pugi::encoding_utf16:
+      return 2;
+    case pugi::encoding_utf32_le:
+    case pugi::encoding_utf32_be:
+    case pugi::encoding_utf32:
+      return 4;
+    case pugi::encoding_wchar:
+      return sizeof(wchar_t);
+    default:
+      return 1;
+  }
+}
+
+}  // namespace
+
+pugi::xml_parse_result LoadDayFile(pugi::xml_document& doc, std::string_view bytes,
+                                   unsigned options) {
+  pugi::xml_parse_result parsed =
+      doc.load_buffer(bytes.data(), bytes.size(), options, pugi::encoding_auto);
+  if (!parsed) return parsed;
+  if (const auto nul = FirstNul(bytes, UnitOf(parsed.encoding))) {
+    doc.reset();
+    parsed.status = pugi::status_bad_pcdata;
+    parsed.offset = static_cast<std::ptrdiff_t>(*nul);
+  }
+  return parsed;
 }
 
 }  // namespace quendal::xml

@@ -1,6 +1,7 @@
 // What the carriers' XML files share: element text that keeps a file
-// well-formed whatever the host holds, elements with text, and the
-// indented tree with every line ended by carriage return and line feed.
+// well-formed whatever the host holds, elements with text, the indented
+// tree with every line ended by carriage return and line feed, and the
+// reading of a day file written earlier.
 #pragma once
 
 #include <pugixml.hpp>
@@ -34,5 +35,13 @@ class CrLfWriter : public pugi::xml_writer {
 // The node and what it holds as the indented file shows it at `depth`
 // (0 for the document itself), each line ended by CR LF.
 void AppendIndented(std::string& out, pugi::xml_node node, unsigned depth = 0);
+
+// Reads a day file back. pugixml ends its parse at a NUL character, which
+// XML allows nowhere, so a file with one after its root read as whole up to
+// there: extending or rewriting it would misplace or drop what follows. Such
+// a file reads as malformed (status_bad_pcdata, offset at the NUL), in
+// whichever encoding pugixml found.
+pugi::xml_parse_result LoadDayFile(pugi::xml_document& doc, std::string_view bytes,
+                                   unsigned options);
 
 }  // namespace quendal::xml

@@ -196,6 +196,8 @@ TEST_F(DFEDAxmlTest, OnlyAUtf8NewDataSetEndingInItsEndTagIsExtended) {
       "<NewDataSet/>\r\n",
       "<?xml version='1.0' encoding='windows-1252'?>\r\n<NewDataSet>\r\n</NewDataSet>\r\n",
       kHead + kTail + "<!-- after the root -->\r\n",
+      // A NUL ends the parser's reading; the end tag after it is not the root's.
+      kHead + kTail + std::string(1, '\0') + "\r\n" + kTail,
       "<Other></Other>\r\n",
   };
   for (const std::string& other : others) {

@@ -246,6 +246,16 @@ TEST_F(eParcelManifestTest, AnUnreadableDayFileIsKeptAndTheRunGoesBesideIt) {
                 "NPP1_0999_EP.xml cannot be read as a PCMS manifest; it is kept and the "
                 "consignments are written to " +
                 folder + "NPP1_0999_EP_2.xml.");
+
+  // A whole manifest with a NUL and more after it: rewriting it would drop
+  // what follows the NUL, so it is kept too.
+  const std::string held = FileText("NPP1_0999_EP_2.xml") + std::string(1, '\0') + "<more/>";
+  ASSERT_TRUE(ReplaceFile(folder + "NPP1_0999_EP_2.xml", held));
+  ExpressToJSmith();
+  Run(kManifestClass, {0});
+  EXPECT_EQ(FileText("NPP1_0999_EP_2.xml"), held);
+  EXPECT_EQ(FilesInFolder(),
+            (Strings{"NPP1_0999_EP.xml", "NPP1_0999_EP_2.xml", "NPP1_0999_EP_3.xml"}));
 }
 
 TEST_F(eParcelManifestTest, AFileThatCannotBeWrittenIsReportedAndKeptForAnotherTerm) {

@@ -50,6 +50,14 @@ TEST(PcmsDocumentTest, ReadsWrappedAndBareTreesAndRefusesOthers) {
       "</p:PCMSManifest></p:body></p:SendPCMSManifest>");
   ASSERT_TRUE(bare);
   EXPECT_EQ(bare->ConsignmentCount(), 1u);
+  // UTF-16 is read (its characters hold zero bytes); a NUL character
+  // after the root, where the parser would stop, is refused in either form.
+  const std::string text = run.FileText();
+  std::string utf16 = "\xFF\xFE";
+  for (const char c : text) utf16 += std::string{c, '\0'};
+  EXPECT_TRUE(Document::Parse(utf16));
+  EXPECT_FALSE(Document::Parse(utf16 + std::string(2, '\0') + std::string("<\0x\0/\0>\0", 8)));
+  EXPECT_FALSE(Document::Parse(text + std::string(1, '\0') + "<x/>"));
   EXPECT_FALSE(Document::Parse(""));
   EXPECT_FALSE(Document::Parse("<PCMS><SendPCMSManifest><header/></SendPCMSManifest></PCMS>"));
   EXPECT_FALSE(Document::Parse("<NewDataSet><Table/></NewDataSet>"));
